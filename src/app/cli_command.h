@@ -1,0 +1,28 @@
+#pragma once
+
+#include <QString>
+#include <QStringList>
+
+namespace etq::cli {
+
+// One subcommand of etiquon-cli. `run` gets the arguments after the subcommand's name and
+// returns the process exit code.
+struct Command {
+    const char* name;
+    const char* usage;    // arguments, for --help
+    const char* summary;  // one line, for --help
+    int (*run)(const QStringList& args);
+};
+
+// The options every subcommand shares.
+struct CommonOptions {
+    QString settingId;  // the hosting page's SettingID: selects the settings store
+};
+
+// Removes the shared options from args and returns them.
+CommonOptions takeCommonOptions(QStringList& args);
+
+// Prints a message on stderr, prefixed with the program name.
+void printError(const QString& message);
+
+}  // namespace etq::cli

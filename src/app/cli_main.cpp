@@ -1,0 +1,87 @@
+// etiquon-cli: the component's work without windows, for scripts, tests and the demo.
+#include <QCoreApplication>
+#include <QTextStream>
+#include <cstdio>
+#include <span>
+
+#include "app/cli_command.h"
+
+namespace etq::cli {
+
+CommonOptions takeCommonOptions(QStringList& args) {
+    CommonOptions options;
+    for (qsizetype i = 0; i < args.size();) {
+        if (args[i] == "--setting-id" && i + 1 < args.size()) {
+            options.settingId = args[i + 1];
+            args.remove(i, 2);
+        } else if (args[i].startsWith("--setting-id=")) {
+            options.settingId = args[i].mid(int(sizeof("--setting-id=")) - 1);
+            args.remove(i);
+        } else {
+            ++i;
+        }
+    }
+    return options;
+}
+
+void printError(const QString& message) {
+    QTextStream(stderr) << "etiquon-cli: " << message << Qt::endl;
+}
+
+namespace {
+
+const Command kCommands[] = {
+    {"version", "", "print the version",
+     [](const QStringList&) {
+         QTextStream(stdout) << "etiquon-cli " << ETIQUON_VERSION << Qt::endl;
+         return 0;
+     }},
+};
+
+void printHelp() {
+    QTextStream out(stdout);
+    out << "Usage: etiquon-cli [--setting-id N] COMMAND [ARGS]\n"
+           "       etiquon-cli --help | --version\n\n"
+           "Etiquon prints labels for the items and stock documents of a Hebrew accounting\n"
+           "package. This program does the component's work without windows.\n\nCommands:\n";
+    for (const Command& c : kCommands) {
+        const QString head = QString("  %1 %2").arg(c.name, c.usage).trimmed();
+        out << "  " << head.leftJustified(44) << " " << c.summary << "\n";
+    }
+    out << "\nOptions:\n  --setting-id N   use the settings of the hosting page with this "
+           "SettingID\n";
+}
+
+}  // namespace
+}  // namespace etq::cli
+
+int main(int argc, char** argv) {
+    using namespace etq::cli;
+    QCoreApplication app(argc, argv);
+    QCoreApplication::setApplicationName("etiquon-cli");
+    QCoreApplication::setApplicationVersion(ETIQUON_VERSION);
+
+    QStringList args = app.arguments().mid(1);
+    if (args.isEmpty() || args.first() == "--help" || args.first() == "-h") {
+        printHelp();
+        return args.isEmpty() ? 2 : 0;
+    }
+    if (args.first() == "--version") args.first() = "version";
+
+    // The shared options may stand before the command's name too.
+    QStringList rest = args;
+    takeCommonOptions(rest);
+    if (rest.isEmpty()) {
+        printHelp();
+        return 2;
+    }
+    const QString name = rest.first();
+    for (const Command& c : kCommands) {
+        if (name == c.name) {
+            args.removeOne(name);
+            return c.run(args);
+        }
+    }
+    printError(QString("unknown command '%1' (try --help)").arg(name));
+    return 2;
+}

@@ -1,0 +1,45 @@
+#pragma once
+
+#include <QString>
+
+namespace etq {
+
+// The component's message boxes. Routines report through messages(); the windows install a
+// box that shows them, a headless run writes them on stderr and answers with the default.
+enum class MsgIcon { None, Critical, Question, Exclamation, Information };
+enum class MsgButtons { Ok, YesNo };
+enum class MsgAnswer { Ok, Yes, No };
+
+struct Message {
+    QString text;
+    QString title;
+    MsgIcon icon = MsgIcon::None;
+    MsgButtons buttons = MsgButtons::Ok;
+};
+
+class MessageSink {
+  public:
+    virtual ~MessageSink() = default;
+    virtual MsgAnswer show(const Message& message) = 0;
+};
+
+// Writes the message on stderr; a question is answered with `answer` (Yes unless told).
+class StderrMessageSink : public MessageSink {
+  public:
+    explicit StderrMessageSink(MsgAnswer answer = MsgAnswer::Yes) : answer_(answer) {}
+    MsgAnswer show(const Message& message) override;
+
+  private:
+    MsgAnswer answer_;
+};
+
+// The sink in use. Until one is installed, messages go to stderr.
+MessageSink& messages();
+// Installs a sink (not owned); nullptr restores the stderr sink.
+void setMessageSink(MessageSink* sink);
+
+// Shorthand for the most common report: the failure's text, the critical icon and a title.
+void showCritical(const QString& text, const QString& title);
+MsgAnswer askYesNo(const QString& text, const QString& title, MsgIcon icon = MsgIcon::Question);
+
+}  // namespace etq

@@ -1,0 +1,32 @@
+#!/usr/bin/env bash
+# Installs what a Debian 12 machine lacks to build, run and test Etiquon.
+# Quiet and quick when everything is already there.
+set -euo pipefail
+
+packages=(
+    # build
+    g++ cmake ninja-build pkg-config clang-format
+    # libraries
+    qt6-base-dev libgl-dev libsqlite3-dev libzint-dev
+    unixodbc-dev libsqliteodbc tdsodbc
+    # tests and benchmarks
+    googletest libgtest-dev libgmock-dev libbenchmark-dev
+    sqlite3 zint zbar-tools python3 python3-dbfread
+    # desktop stand-ins: printers, Hebrew fonts, a display for screenshots, a browser
+    cups-client culmus fonts-dejavu-core xvfb xauth chromium
+)
+
+missing=()
+for p in "${packages[@]}"; do
+    if ! dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q 'install ok installed'; then
+        missing+=("$p")
+    fi
+done
+[ ${#missing[@]} -eq 0 ] && exit 0
+
+sudo=""
+[ "$(id -u)" -ne 0 ] && sudo="sudo"
+echo "setup: installing ${missing[*]}"
+export DEBIAN_FRONTEND=noninteractive
+$sudo apt-get update -qq
+$sudo apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null
