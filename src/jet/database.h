@@ -1,0 +1,81 @@
+#pragma once
+
+#include <QList>
+#include <QString>
+#include <QStringList>
+#include <memory>
+
+#include "jet/error.h"
+#include "jet/types.h"
+
+namespace etq::jet {
+
+namespace detail {
+class Connection;
+}
+class Recordset;
+
+// The collating locale every file of the component records: Hebrew sort order, code page 1255.
+inline const QString kHebrewLocale = QStringLiteral(";LANGID=0x040D;CP=1255;COUNTRY=0");
+
+// One database file of the component, opened shared and read-write. Its tables, links and
+// saved queries are defined here; its data is reached through execute() and recordsets.
+// Copies share the same open file; close() closes it for all of them.
+class Database {
+  public:
+    Database() = default;
+
+    // Creates a new file. Creating over an existing file fails (3204): callers delete first.
+    static Database create(const QString& path, const QString& locale = kHebrewLocale);
+    // Opens an existing file (3024 when it is missing, 3343 when it is not a database of ours).
+    static Database open(const QString& path);
+
+    bool isOpen() const { return bool(conn_); }
+    void close();
+    QString path() const;
+    QString locale() const;
+
+    // Definitions ---------------------------------------------------------------------------
+    // A table from its field list and primary key ("PrimaryKey", primary and unique).
+    void createTable(const TableDef& def);
+    // The definition of a local or linked table, as the file records it (3078 when none).
+    TableDef tableDef(const QString& name) const;
+    bool hasTable(const QString& name) const;
+    QStringList tableNames() const;  // local tables, then links, each in creation order
+
+    // Links the table of the same name in another database file. The file and its table must
+    // exist (3024, 3078); the link is kept in this file and resolved on every open.
+    void linkTable(const QString& name, const QString& sourcePath, const QString& sourceTable = {});
+    QList<LinkDef> links() const;
+
+    // Saved queries keep their text exactly as given.
+    void createQuery(const QString& name, const QString& sql);
+    QString querySql(const QString& name) const;  // empty when there is none
+    bool hasQuery(const QString& name) const;
+    QStringList queryNames() const;
+
+    // Work ----------------------------------------------------------------------------------
+    // Runs an action statement, or the saved action query of that name. Rows that would break
+    // a key or a field rule are skipped, as the engine does unless told to fail on errors.
+    // Returns the number of rows written.
+    enum ExecuteOption { SkipFailingRows, FailOnError };
+    int execute(const QString& sqlOrQueryName, ExecuteOption option = SkipFailingRows);
+
+    // A recordset over a table, a saved select query or a SELECT statement.
+    Recordset openRecordset(const QString& source);
+
+    void beginTrans();
+    void commitTrans();
+    void rollback();
+
+    detail::Connection& connection() const;  // for the engine's own parts
+
+  private:
+    explicit Database(std::shared_ptr<detail::Connection> conn) : conn_(std::move(conn)) {}
+    bool nameTaken(const QString& name) const;
+    void attachLinks();
+
+    std::shared_ptr<detail::Connection> conn_;
+};
+
+}  // namespace etq::jet

@@ -1,0 +1,84 @@
+#pragma once
+
+// The inside of a recordset, shared by the recordset and the database that opens it.
+
+#include <QHash>
+#include <QList>
+#include <QVector>
+#include <memory>
+#include <optional>
+#include <vector>
+
+#include "jet/connection.h"
+#include "jet/recordset.h"
+#include "jet/sql_translator.h"
+
+namespace etq::jet {
+
+struct Recordset::Impl {
+    static std::unique_ptr<Impl> forTable(std::shared_ptr<detail::Connection> conn,
+                                          const TableDef& table);
+    static std::unique_ptr<Impl> forQuery(std::shared_ptr<detail::Connection> conn,
+                                          const QString& jetSql);
+
+    // A column of the recordset and where its values are written.
+    struct Column {
+        QString name;
+        std::optional<FieldDef> def;  // the base table's field; none for a computed column
+        int base = -1;                // index into bases; -1 = not updatable
+        QString baseColumn;
+    };
+    struct Base {
+        QString table;  // as the statements name it
+        QString schemaTable;
+    };
+    // A row of a query recordset: its values and the rowid of each base table's row.
+    struct Row {
+        QVector<QVariant> values;
+        QVector<qint64> rowids;
+    };
+
+    std::shared_ptr<detail::Connection> conn;
+    bool tableMode = false;
+    QString sourceSql;  // query recordsets: the text they were opened on, for requery
+
+    QList<Column> columns;
+    QList<Base> bases;
+    QHash<QString, int> columnByName;  // lower-case name -> index
+
+    // Table recordsets: the rowids in order, and the current row once it has been read.
+    std::vector<qint64> keys;
+    mutable qint64 cachedKey = -1;
+    mutable QVector<QVariant> cachedRow;
+    QString selectRowSql;
+
+    // Query recordsets: every row, read when the recordset opens.
+    std::vector<Row> rows;
+    QString translatedSql;
+    QList<sql::SourceTable> rowidTables;
+
+    int pos = -1;  // -1 before the first row, count() after the last
+    bool currentDeleted = false;
+    bool noMatch = false;
+
+    EditMode mode = NoEdit;
+    QVector<QVariant> buffer;  // stored forms
+    std::vector<bool> changed;
+
+    int count() const { return tableMode ? int(keys.size()) : int(rows.size()); }
+    bool onRow() const { return pos >= 0 && pos < count() && !currentDeleted; }
+    void requireRow() const;
+    void load();
+    const QVector<QVariant>& currentStored() const;
+    qint64 rowidOf(int row, int base) const;
+    int columnIndex(const QString& name) const;
+    void leaveEdit();
+
+    void writeEdit();
+    void writeNew();
+    int findFrom(int start, const QString& criterion);
+    int findInTable(int start, const QString& criterion);
+    int findInRows(int start, const QString& criterion);
+};
+
+}  // namespace etq::jet
