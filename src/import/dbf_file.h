@@ -1,0 +1,112 @@
+#pragma once
+
+#include <QByteArrayView>
+#include <QList>
+#include <QString>
+#include <exception>
+#include <memory>
+
+class QFile;
+
+namespace etq {
+
+// A host file that cannot be read as a dBASE file, or a read outside its records. The message
+// names the file and says what is wrong.
+class DbfError : public std::exception {
+  public:
+    explicit DbfError(QString message);
+    const QString& message() const { return message_; }
+    const char* what() const noexcept override { return utf8_.constData(); }
+
+  private:
+    QString message_;
+    QByteArray utf8_;
+};
+
+// A field at a fixed place in a record: byte offset from the record's start (byte 0 is the
+// deletion flag) and width in bytes.
+struct FixedField {
+    int offset = 0;
+    int width = 0;
+};
+
+// A field descriptor of the file's header, as the file describes itself.
+struct DbfField {
+    QString name;
+    char type = 'C';
+    int length = 0;
+    int decimals = 0;
+    int offset = 0;  // from the record's start: the first field starts at 1
+};
+
+// A host dBASE file opened for reading. The host's readers take fields at fixed offsets, so
+// the field descriptors are parsed for inspection only. The file is memory-mapped: host files
+// can be tens of megabytes and are read record by record.
+//
+// Everything is checked when the file is opened (the header against the file's size) and on
+// every access (the field against the record length, the record against the record count);
+// a failure throws DbfError and nothing is ever read past a record or the file.
+class DbfFile {
+  public:
+    // Opens and validates `path`; throws DbfError.
+    explicit DbfFile(const QString& path);
+    ~DbfFile();
+    DbfFile(DbfFile&&) noexcept;
+    DbfFile& operator=(DbfFile&&) noexcept;
+
+    const QString& path() const { return path_; }
+    qint64 recordCount() const { return recordCount_; }
+    int headerLength() const { return headerLength_; }
+    int recordLength() const { return recordLength_; }
+    const QList<DbfField>& fields() const { return fields_; }
+    // The descriptor called `name` (case-insensitive), or nullptr.
+    const DbfField* field(QStringView name) const;
+
+    // A reader whose layout needs `length` bytes a record calls this first; a shorter record
+    // throws DbfError naming `what` (the layout, e.g. "item record").
+    void requireRecordLength(int length, const QString& what) const;
+
+    // Record access. `record` counts from 0. Bytes returned point into the mapped file and
+    // stay valid while this object lives.
+    QByteArrayView record(qint64 record) const;
+    bool isDeleted(qint64 record) const;
+    // Windows-1255 text, trimmed of leading and trailing blanks (spaces, and the NUL bytes
+    // some writers leave in unused fields).
+    QString text(qint64 record, int offset, int width) const;
+    QString text(qint64 record, FixedField field) const {
+        return text(record, field.offset, field.width);
+    }
+    // The same, untrimmed.
+    QString rawText(qint64 record, int offset, int width) const;
+    QString rawText(qint64 record, FixedField field) const {
+        return rawText(record, field.offset, field.width);
+    }
+    // Signed 32-bit little-endian integer.
+    qint32 int32(qint64 record, int offset) const;
+    QByteArrayView bytes(qint64 record, int offset, int width) const;
+    QByteArrayView bytes(qint64 record, FixedField field) const {
+        return bytes(record, field.offset, field.width);
+    }
+
+  private:
+    void readHeader(qint64 fileSize);
+    void readFieldDescriptors();
+    [[noreturn]] void fail(const QString& what) const;
+    const char* at(qint64 record, int offset, int width) const {
+        if (record < 0 || record >= recordCount_ || offset < 0 || width < 0 ||
+            offset > recordLength_ - width)
+            failAccess(record, offset, width);
+        return data_ + headerLength_ + record * recordLength_ + offset;
+    }
+    [[noreturn]] void failAccess(qint64 record, int offset, int width) const;
+
+    QString path_;
+    std::unique_ptr<QFile> file_;
+    const char* data_ = nullptr;
+    qint64 recordCount_ = 0;
+    int headerLength_ = 0;
+    int recordLength_ = 0;
+    QList<DbfField> fields_;
+};
+
+}  // namespace etq
