@@ -118,6 +118,8 @@ void Recordset::Impl::load() {
         for (int i = 0; i < columns.size(); ++i) {
             const QString key = columns[i].name.toLower();
             if (!columnByName.contains(key)) columnByName.insert(key, i);
+            if (!columnByExactName.contains(columns[i].name))
+                columnByExactName.insert(columns[i].name, i);
         }
     }
     buffer = QVector<QVariant>(columns.size());
@@ -156,6 +158,8 @@ qint64 Recordset::Impl::rowidOf(int row, int base) const {
 }
 
 int Recordset::Impl::columnIndex(const QString& name) const {
+    if (const auto it = columnByExactName.constFind(name); it != columnByExactName.constEnd())
+        return it.value();
     const QString lower = name.toLower();
     if (const auto it = columnByName.constFind(lower); it != columnByName.constEnd())
         return it.value();
@@ -184,29 +188,65 @@ void Recordset::Impl::leaveEdit() {
 // ---------------------------------------------------------------------------------------------
 // Writing
 
+quint64 Recordset::Impl::changedMask() const {
+    quint64 mask = 0;
+    for (int i = 0; i < columns.size() && i < 64; ++i)
+        if (changed[size_t(i)]) mask |= quint64(1) << i;
+    return mask;
+}
+
+// The changed columns of one base table, in column order: ?1.. are their values, the last
+// parameter the row's rowid.
+QString Recordset::Impl::buildUpdateSql(int base) const {
+    QStringList sets;
+    for (int i = 0; i < columns.size(); ++i) {
+        if (!changed[size_t(i)] || columns[i].base != base) continue;
+        sets << QString("%1 = ?%2").arg(quoteName(columns[i].baseColumn)).arg(sets.size() + 1);
+    }
+    return QString("UPDATE %1 SET %2 WHERE rowid = ?%3")
+        .arg(quoteName(bases[base].table), sets.join(", "))
+        .arg(sets.size() + 1);
+}
+
+QString Recordset::Impl::buildInsertSql(int base) const {
+    QStringList names, marks;
+    for (int i = 0; i < columns.size(); ++i) {
+        if (!changed[size_t(i)] || columns[i].base != base) continue;
+        names << quoteName(columns[i].baseColumn);
+        marks << QString("?%1").arg(marks.size() + 1);
+    }
+    const QString table = quoteName(bases[base].table);
+    if (names.isEmpty()) return QString("INSERT INTO %1 DEFAULT VALUES").arg(table);
+    return QString("INSERT INTO %1 (%2) VALUES (%3)")
+        .arg(table, names.join(", "), marks.join(", "));
+}
+
 void Recordset::Impl::writeEdit() {
     std::set<int> touched;
     for (int i = 0; i < columns.size(); ++i)
         if (changed[size_t(i)]) touched.insert(columns[i].base);
+    // A table recordset has one base; its statements are kept by the columns they write.
+    const bool cacheable = tableMode && columns.size() <= 64;
     for (const int b : touched) {
         const qint64 rowid = rowidOf(pos, b);
         if (rowid < 0)
             fail(
                 err::kFieldNotUpdatable,
                 QString("Field can't be updated: the row of '%1' is missing.").arg(bases[b].table));
-        QStringList sets;
-        QList<QVariant> values;
-        for (int i = 0; i < columns.size(); ++i) {
-            if (!changed[size_t(i)] || columns[i].base != b) continue;
-            values << buffer[i];
-            sets << QString("%1 = ?%2").arg(quoteName(columns[i].baseColumn)).arg(values.size());
+        QString sql;
+        if (cacheable) {
+            const quint64 mask = changedMask();
+            auto it = updateSql.find(mask);
+            if (it == updateSql.end()) it = updateSql.insert(mask, buildUpdateSql(b));
+            sql = it.value();
+        } else {
+            sql = buildUpdateSql(b);
         }
-        Stmt s = conn->prepare(QString("UPDATE %1 SET %2 WHERE rowid = ?%3")
-                                   .arg(quoteName(bases[b].table), sets.join(", "))
-                                   .arg(values.size() + 1));
-        for (int k = 0; k < values.size(); ++k)
-            s.bind(k + 1, values[k]);
-        s.bind(int(values.size()) + 1, rowid);
+        Stmt s = conn->prepare(sql);
+        int k = 0;
+        for (int i = 0; i < columns.size(); ++i)
+            if (changed[size_t(i)] && columns[i].base == b) s.bind(++k, buffer[i]);
+        s.bind(k + 1, rowid);
         s.step();
     }
     if (tableMode) {
@@ -226,20 +266,19 @@ void Recordset::Impl::writeNew() {
     if (touched.size() != 1)
         fail(err::kReadOnly, "Cannot add the record: its fields belong to more than one table.");
     const int b = *touched.begin();
-    QStringList names, marks;
-    QList<QVariant> values;
-    for (int i = 0; i < columns.size(); ++i) {
-        if (!changed[size_t(i)] || columns[i].base != b) continue;
-        values << buffer[i];
-        names << quoteName(columns[i].baseColumn);
-        marks << QString("?%1").arg(values.size());
+    QString sql;
+    if (columns.size() <= 64) {
+        const quint64 mask = changedMask();
+        auto it = insertSql.find(mask);
+        if (it == insertSql.end()) it = insertSql.insert(mask, buildInsertSql(b));
+        sql = it.value();
+    } else {
+        sql = buildInsertSql(b);
     }
-    const QString table = quoteName(bases[b].table);
-    Stmt s = conn->prepare(values.isEmpty() ? QString("INSERT INTO %1 DEFAULT VALUES").arg(table)
-                                            : QString("INSERT INTO %1 (%2) VALUES (%3)")
-                                                  .arg(table, names.join(", "), marks.join(", ")));
-    for (int k = 0; k < values.size(); ++k)
-        s.bind(k + 1, values[k]);
+    Stmt s = conn->prepare(sql);
+    int k = 0;
+    for (int i = 0; i < columns.size(); ++i)
+        if (changed[size_t(i)] && columns[i].base == b) s.bind(++k, buffer[i]);
     s.step();
     const qint64 rowid = sqlite3_last_insert_rowid(conn->db());
     // The new row joins the end of the recordset; the current row stays current.
@@ -270,22 +309,33 @@ int Recordset::Impl::findFrom(int start, const QString& criterion) {
 }
 
 int Recordset::Impl::findInTable(int start, const QString& criterion) {
-    sql::Options options;
-    options.parameterizeLiterals = true;
-    const sql::Translation t = sql::translateCriterion(criterion, options);
-    const int startMark = int(t.parameters.size()) + 1;
+    // The import finds every key with a criterion of the same shape (ItemKey="..."): the
+    // shape is looked up, and only a new shape is translated.
+    QList<QVariant> literals;
+    const QString shape = sql::criterionShape(criterion, &literals);
+    auto it = findByShape.find(shape);
+    if (it == findByShape.end()) {
+        sql::Options options;
+        options.parameterizeLiterals = true;
+        const sql::Translation t = sql::translateCriterion(criterion, options);
+        FindStatement f;
+        f.literalCount = int(t.parameters.size());
+        f.sql = QString("SELECT rowid FROM %1 WHERE (%2) AND rowid >= ?%3 ORDER BY rowid")
+                    .arg(quoteName(bases[0].table), t.sql)
+                    .arg(f.literalCount + 1);
+        it = findByShape.insert(shape, f);
+    }
+    if (it->literalCount != literals.size())
+        fail(err::kSyntax, QString("Syntax error in criterion '%1'.").arg(criterion));
     // The criterion goes to the table's indexes; only rows of this recordset count.
-    Stmt s =
-        conn->prepare(QString("SELECT rowid FROM %1 WHERE (%2) AND rowid >= ?%3 ORDER BY rowid")
-                          .arg(quoteName(bases[0].table), t.sql)
-                          .arg(startMark));
-    for (int k = 0; k < t.parameters.size(); ++k)
-        s.bind(k + 1, t.parameters[k].literal);
-    s.bind(startMark, keys[size_t(start)]);
+    Stmt s = conn->prepare(it->sql);
+    for (int k = 0; k < literals.size(); ++k)
+        s.bind(k + 1, literals[k]);
+    s.bind(it->literalCount + 1, keys[size_t(start)]);
     while (s.step()) {
         const qint64 rowid = sqlite3_column_int64(s.get(), 0);
-        const auto it = std::lower_bound(keys.begin() + start, keys.end(), rowid);
-        if (it != keys.end() && *it == rowid) return int(it - keys.begin());
+        const auto found = std::lower_bound(keys.begin() + start, keys.end(), rowid);
+        if (found != keys.end() && *found == rowid) return int(found - keys.begin());
     }
     return -1;
 }

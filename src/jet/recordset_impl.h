@@ -44,7 +44,15 @@ struct Recordset::Impl {
 
     QList<Column> columns;
     QList<Base> bases;
-    QHash<QString, int> columnByName;  // lower-case name -> index
+    QHash<QString, int> columnByName;       // lower-case name -> index
+    QHash<QString, int> columnByExactName;  // as written, so the usual lookup allocates nothing
+
+    // Statement texts by the set of columns written (bit i = column i), built once each.
+    QHash<quint64, QString> insertSql;
+    QHash<quint64, QString> updateSql;  // table recordsets only
+    quint64 changedMask() const;
+    QString buildUpdateSql(int base) const;
+    QString buildInsertSql(int base) const;
 
     // Table recordsets: the rowids in order, and the current row once it has been read.
     std::vector<qint64> keys;
@@ -79,6 +87,12 @@ struct Recordset::Impl {
     int findFrom(int start, const QString& criterion);
     int findInTable(int start, const QString& criterion);
     int findInRows(int start, const QString& criterion);
+    // Finds in a table: criteria of one shape share one statement; the literals are bound.
+    struct FindStatement {
+        QString sql;
+        int literalCount = 0;
+    };
+    QHash<QString, FindStatement> findByShape;
 };
 
 }  // namespace etq::jet

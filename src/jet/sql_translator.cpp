@@ -771,10 +771,7 @@ class Parser {
                 }
                 unexpected("a value expected");
             case Token::Identifier:
-                if (t.is("true") || t.is("false")) {
-                    const bool yes = next().is("true");
-                    return literal(qint64(yes ? -1 : 0), yes ? "-1" : "0");
-                }
+                if (t.is("true") || t.is("false")) return next().is("true") ? "-1" : "0";
                 if (t.is("null")) {
                     next();
                     return "NULL";
@@ -932,6 +929,60 @@ class Parser {
 };
 
 }  // namespace
+
+QString criterionShape(const QString& criterion, QList<QVariant>* literals) {
+    QString shape;
+    shape.reserve(criterion.size());
+    const qsizetype n = criterion.size();
+    for (qsizetype i = 0; i < n;) {
+        const QChar c = criterion[i];
+        if (isNameStart(c) || c == u'[') {
+            // Names (digits inside them too) belong to the shape.
+            const qsizetype j = c == u'[' ? std::max(criterion.indexOf(u']', i), i) + 1 : i + 1;
+            qsizetype k = j;
+            if (c != u'[')
+                while (k < n && isNameChar(criterion[k]))
+                    ++k;
+            shape += QStringView(criterion).mid(i, k - i);
+            i = k;
+        } else if (c == u'\'' || c == u'"') {
+            QString value;
+            qsizetype j = i + 1;
+            for (; j < n; ++j) {
+                if (criterion[j] == c) {
+                    if (j + 1 < n && criterion[j + 1] == c) {
+                        value += c;
+                        ++j;
+                        continue;
+                    }
+                    break;
+                }
+                value += criterion[j];
+            }
+            literals->append(value);
+            shape += u'\x01';
+            i = j + 1;
+        } else if (c.isDigit() || (c == u'.' && i + 1 < n && criterion[i + 1].isDigit()) ||
+                   c == u'#') {
+            // Numbers and dates: let the tokenizer read exactly one token here.
+            const QList<Token> one = tokenize(criterion.mid(i));
+            const Token& t = one.first();
+            if (t.kind == Token::Number) {
+                const bool whole =
+                    !t.text.contains(u'.') && !t.text.contains(u'e', Qt::CaseInsensitive);
+                literals->append(whole ? QVariant(t.text.toLongLong()) : QVariant(t.number));
+            } else {
+                literals->append(t.number);
+            }
+            shape += u'\x02';
+            i += t.text.size();
+        } else {
+            shape += c;
+            ++i;
+        }
+    }
+    return shape;
+}
 
 Translation translate(const QString& jetSql, const Options& options) {
     Parser parser(jetSql, options);

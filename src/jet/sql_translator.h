@@ -69,6 +69,11 @@ Translation translate(const QString& jetSql, const Options& options = {});
 // Translates a criterion (the text after WHERE), as FindFirst takes it.
 Translation translateCriterion(const QString& criterion, const Options& options = {});
 
+// The criterion with its literals taken out, and the literals in order: criteria that differ
+// only in their literals have one shape, and translateCriterion with parameterizeLiterals
+// gives them the same text with the literals as ?1, ?2, ...
+QString criterionShape(const QString& criterion, QList<QVariant>* literals);
+
 // The name the SQLite side gives an identifier: double-quoted, inner quotes doubled.
 QString quoteName(const QString& name);
 // A text literal for SQLite: single-quoted, inner apostrophes doubled.
