@@ -1,0 +1,78 @@
+#include "import/connection.h"
+
+#include <QFileInfo>
+
+#include "platform/settings_store.h"
+#include "platform/user_paths.h"
+#include "shell/settings_groups.h"
+
+namespace etq {
+
+namespace {
+
+const QString kParams = QStringLiteral("Params");
+
+QString readParam(const SettingsStore& store, const QString& key) {
+    return store.read(kParams, key, settingDefault(kParams, key));
+}
+
+}  // namespace
+
+ConnParams& connParams() {
+    static ConnParams params{
+        settingDefault(u"Params", u"ConnServer"), settingDefault(u"Params", u"ConnUID"),
+        settingDefault(u"Params", u"ConnPWD"), settingDefault(u"Params", u"ConnDataBase")};
+    return params;
+}
+
+void GetConnParams() {
+    const SettingsStore store(applicationName());
+    ConnParams& p = connParams();
+    p.server = readParam(store, QStringLiteral("ConnServer"));
+    p.user = readParam(store, QStringLiteral("ConnUID"));
+    p.password = readParam(store, QStringLiteral("ConnPWD"));
+    p.database = readParam(store, QStringLiteral("ConnDataBase"));
+}
+
+QString BuildConnString(const QString& server, const QString& user, const QString& password,
+                        const QString& database, qint16 form) {
+    switch (form) {
+        case 1:
+            return QStringLiteral("driver={SQL Server};server=%1;uid=%2;pwd=%3;database=%4")
+                .arg(server, user, password, database);
+        case 2:
+            return QStringLiteral(
+                       "Provider=sqloledb;Data Source=%1;User Id=%2;Password=%3;Initial Catalog=%4")
+                .arg(server, user, password, database);
+        case 3:
+            // Settings written on Windows end the server folder with a backslash.
+            if (server.endsWith(u'\\')) return joinPath(server.chopped(1), database);
+            return joinPath(server, database);
+        default:
+            return {};
+    }
+}
+
+QString companyFolder() {
+    const ConnParams& p = connParams();
+    return BuildConnString(p.server, p.user, p.password, p.database, 3);
+}
+
+void SetGetRegConnParams(quint8 action, QString& server, QString& database) {
+    SettingsStore store(applicationName());
+    if (action == 1) {
+        store.write(kParams, QStringLiteral("ConnServer"), server);
+        store.write(kParams, QStringLiteral("ConnDataBase"), database);
+        store.sync();  // the dialog goes on whether or not the store took the values
+    } else if (action == 2) {
+        server = readParam(store, QStringLiteral("ConnServer"));
+        database = readParam(store, QStringLiteral("ConnDataBase"));
+    }
+}
+
+bool companyFolderHasAccounts(const QString& server, const QString& database) {
+    const QString folder = BuildConnString(server, {}, {}, database, 3);
+    return QFileInfo(joinPath(folder, QStringLiteral("ocrd.dbf"))).isFile();
+}
+
+}  // namespace etq

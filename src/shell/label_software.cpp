@@ -1,0 +1,89 @@
+#include "shell/label_software.h"
+
+#include <QStringList>
+
+#include "shell/surface.h"
+
+namespace etq {
+
+namespace {
+
+struct KindFilters {
+    qint16 kind;
+    QStringView labelFiles;
+    QStringView software;
+};
+
+constexpr KindFilters kFilters[] = {
+    {2, u"All Files (*.*)|*.*|CodeSoft Files (*.lab)|*.lab",
+     u"All Software (*.exe)|*.exe|CodeSoft Software|Lppa.exe"},
+    {4, u"All Files (*.*)|*.*|BarTender Files (*.btw)|*.btw",
+     u"All Software (*.exe)|*.exe|BarTender Software|Bartend.exe"},
+    {5, u"All Files (*.*)|*.*|NiceLabel Files (*.lbl)|*.lbl",
+     u"All Software (*.exe)|*.exe|NiceLabel Software|Nice3.exe"},
+    {7, u"All Files (*.*)|*.*|FastLabel Files (*.lbl)|*.lbl",
+     u"All Software (*.exe)|*.exe|FastLabel Software|fastlbl.exe"},
+};
+
+const KindFilters* filtersOf(qint16 kind) {
+    for (const KindFilters& f : kFilters)
+        if (f.kind == kind) return &f;
+    return nullptr;
+}
+
+// The dialogs preselect the kind's own files, the second filter.
+constexpr int kPreselectedFilter = 2;
+
+QString choose(const QString& filter, FileChooser& chooser) {
+    return chooser.chooseFile(toQtFilter(filter), kPreselectedFilter);
+}
+
+}  // namespace
+
+qint16 GetLabelSoftwareKind(const Surface& surface) {
+    auto selected = [&](int i) {
+        return surface.control(QStringLiteral("OptOLE"), i).value().toBool();
+    };
+    if (selected(0)) return 5;
+    if (selected(1)) return 2;
+    if (selected(2)) return 4;
+    if (selected(3)) return 6;
+    if (selected(4)) return 7;
+    return 0;
+}
+
+QString labelFileFilter(qint16 kind) {
+    const KindFilters* f = filtersOf(kind);
+    return f ? f->labelFiles.toString() : QString();
+}
+
+QString labelSoftwareFilter(qint16 kind) {
+    const KindFilters* f = filtersOf(kind);
+    return f ? f->software.toString() : QString();
+}
+
+QString toQtFilter(const QString& filter) {
+    const QStringList parts = filter.split(u'|');
+    QStringList filters;
+    for (qsizetype i = 0; i + 1 < parts.size(); i += 2) {
+        QString name = parts[i].trimmed();
+        // The name may show its patterns already; Qt reads them from the parentheses.
+        const qsizetype open = name.lastIndexOf(u'(');
+        if (open > 0 && name.endsWith(u')')) name = name.left(open).trimmed();
+        QStringList patterns = parts[i + 1].split(u';', Qt::SkipEmptyParts);
+        for (QString& p : patterns)
+            if (p.trimmed() == u"*.*") p = QStringLiteral("*");
+        filters.append(QStringLiteral("%1 (%2)").arg(name, patterns.join(u' ')));
+    }
+    return filters.join(QStringLiteral(";;"));
+}
+
+QString SelectLabelFile(qint16 kind, FileChooser& chooser) {
+    return choose(labelFileFilter(kind), chooser);
+}
+
+QString SelectLabelSoftware(qint16 kind, FileChooser& chooser) {
+    return choose(labelSoftwareFilter(kind), chooser);
+}
+
+}  // namespace etq
