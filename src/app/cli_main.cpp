@@ -28,6 +28,8 @@ void printError(const QString& message) {
     QTextStream(stderr) << "etiquon-cli: " << message << Qt::endl;
 }
 
+int runConfig(const QStringList& args);  // cli_config.cpp
+
 namespace {
 
 const Command kCommands[] = {
@@ -36,6 +38,8 @@ const Command kCommands[] = {
          QTextStream(stdout) << "etiquon-cli " << ETIQUON_VERSION << Qt::endl;
          return 0;
      }},
+    {"config", "list | get SECTION KEY | set SECTION KEY VALUE",
+     "read and write the settings of the control", runConfig},
 };
 
 void printHelp() {
