@@ -22,6 +22,11 @@ struct CommonOptions {
 // Removes the shared options from args and returns them.
 CommonOptions takeCommonOptions(QStringList& args);
 
+// Removes "--name VALUE" (or "--name=VALUE") from args and returns VALUE; empty when absent.
+QString takeOption(QStringList& args, const QString& name);
+// Removes "--name" from args; true when it was there.
+bool takeFlag(QStringList& args, const QString& name);
+
 // Prints a message on stderr, prefixed with the program name.
 void printError(const QString& message);
 

@@ -24,11 +24,31 @@ CommonOptions takeCommonOptions(QStringList& args) {
     return options;
 }
 
+QString takeOption(QStringList& args, const QString& name) {
+    for (qsizetype i = 0; i < args.size(); ++i) {
+        if (args[i] == name && i + 1 < args.size()) {
+            const QString value = args[i + 1];
+            args.remove(i, 2);
+            return value;
+        }
+        if (args[i].startsWith(name + "=")) {
+            const QString value = args[i].mid(name.size() + 1);
+            args.remove(i);
+            return value;
+        }
+    }
+    return {};
+}
+
+bool takeFlag(QStringList& args, const QString& name) { return args.removeAll(name) > 0; }
+
 void printError(const QString& message) {
     QTextStream(stderr) << "etiquon-cli: " << message << Qt::endl;
 }
 
 int runConfig(const QStringList& args);  // cli_config.cpp
+int runInitDb(const QStringList& args);  // cli_db.cpp
+int runUpgrade(const QStringList& args);  // cli_db.cpp
 
 namespace {
 
@@ -40,6 +60,8 @@ const Command kCommands[] = {
      }},
     {"config", "list | get SECTION KEY | set SECTION KEY VALUE",
      "read and write the settings of the control", runConfig},
+    {"init-db", "--db DIR", "prepare a database folder for a first run", runInitDb},
+    {"upgrade", "--db DIR", "add the account tables to an older item database", runUpgrade},
 };
 
 void printHelp() {

@@ -281,7 +281,10 @@ QList<LinkDef> Database::links() const {
 void Database::createQuery(const QString& name, const QString& sqlText) {
     if (name.trimmed().isEmpty()) fail(err::kInvalidArgument, "A query needs a name.");
     if (nameTaken(name)) fail(err::kObjectExists, QString("Object '%1' already exists.").arg(name));
-    sql::translate(sqlText);  // the engine checks the text when the query is made
+    // The engine checks the text when the query is made; the tables may come later.
+    sql::Options syntaxOnly;
+    syntaxOnly.primaryKey = [](const QString&) { return QStringList{"?"}; };
+    sql::translate(sqlText, syntaxOnly);
     Stmt add =
         connection().prepare("INSERT INTO main.MSysQueries (Name, SQL) VALUES (?1, ?2)", false);
     add.bind(1, name);

@@ -61,6 +61,16 @@ bool parseDeclaredType(const QString& declared, FieldType* type, int* size) {
     return false;
 }
 
+bool parseTypeName(const QString& name, FieldType* type) {
+    for (const TypeName& t : kTypes) {
+        if (name.compare(QLatin1String(t.display), Qt::CaseInsensitive) == 0) {
+            *type = t.type;
+            return true;
+        }
+    }
+    return false;
+}
+
 QString typeName(FieldType type) {
     for (const TypeName& t : kTypes)
         if (t.type == type) return t.display;

@@ -48,6 +48,7 @@ struct LinkDef {
 QString declaredType(const FieldDef& field);
 // The field type and size of a declared type; false when it is none of ours.
 bool parseDeclaredType(const QString& declared, FieldType* type, int* size);
-QString typeName(FieldType type);  // "Text", "Long", ... for messages
+QString typeName(FieldType type);  // "Text", "Long", "Yes/No", ...
+bool parseTypeName(const QString& name, FieldType* type);
 
 }  // namespace etq::jet

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "support/qt_print.h"
+
 #include <QTemporaryDir>
 
 #include "jet/database.h"

@@ -1,0 +1,139 @@
+#include "db/local_databases.h"
+
+#include <QFile>
+#include <QFileInfo>
+
+#include "db/file_names.h"
+#include "db/schemas.h"
+#include "platform/messages.h"
+#include "shell/captions.h"
+
+namespace etq::db {
+
+using jet::Database;
+using jet::JetError;
+
+namespace {
+
+// Creation replaces a file that is there.
+void removeExisting(const QString& path) {
+    if (!QFileInfo::exists(path)) return;
+    QFile file(path);
+    if (!file.remove())
+        jet::fail(jet::err::kCannotOpen,
+                  QString("Cannot replace '%1': %2.").arg(path, file.errorString()));
+}
+
+void reportEngineError(const JetError& e) {
+    showCritical(e.description(), GetCaption(1));
+}
+
+// Runs a creation step list and turns a failure into the reported empty result.
+QString created(const QString& path, const std::function<void()>& build) {
+    try {
+        build();
+        return path;
+    } catch (const JetError& e) {
+        reportEngineError(e);
+        return {};
+    }
+}
+
+void createQueries(Database& db, const schema::SavedQuery* queries, size_t count) {
+    for (size_t i = 0; i < count; ++i)
+        db.createQuery(queries[i].name, queries[i].sql);
+}
+
+}  // namespace
+
+void AttachTable(Database& db, const QString& sourcePath, const QString& tableName) {
+    db.linkTable(tableName, sourcePath, tableName);
+}
+
+QString CreateDocDatabase(const QString& docRefPath, const QString& itemDbPath,
+                          const QString& workPath, const QString& logDbPath) {
+    return created(workPath, [&] {
+        removeExisting(workPath);
+        Database db = Database::create(workPath);
+        db.createTable(schema::tempDocHeaders());
+        db.createTable(schema::tempDocLines());
+        db.createTable(schema::transports());
+        for (const schema::Link& link : schema::workLinks()) {
+            const bool fromItems = *link.sourceFile == kItemDatabaseFile;
+            AttachTable(db, fromItems ? itemDbPath : docRefPath, link.table);
+        }
+        if (!logDbPath.isEmpty()) AttachTable(db, logDbPath, schema::stockLog().name);
+        createQueries(db, schema::kWorkQueries, std::size(schema::kWorkQueries));
+    });
+}
+
+QString CreateItemDatabase(const QString& path) {
+    return created(path, [&] {
+        removeExisting(path);
+        Database db = Database::create(path);
+        for (const jet::TableDef* t :
+             {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
+            db.createTable(*t);
+        createQueries(db, schema::kItemQueries, std::size(schema::kItemQueries));
+    });
+}
+
+QString AddAccountTables(const QString& path) {
+    // A missing file is told in English whatever the language, as the upgrade always did.
+    if (!QFileInfo::exists(path)) {
+        showCritical("Database not found", "Error");
+        return {};
+    }
+    return created(path, [&] {
+        Database db = Database::open(path);
+        db.createTable(schema::accountDef());
+        db.createTable(schema::priceList());
+    });
+}
+
+QString CreateTempItemDatabase(const QString& tempPath, const QString& itemDbPath) {
+    return created(tempPath, [&] {
+        removeExisting(tempPath);
+        Database db = Database::create(tempPath);
+        for (const jet::TableDef* t : {&schema::tempItems(), &schema::tempAlterKeys(),
+                                       &schema::tempAlterPrices(), &schema::tempPriceList()})
+            db.createTable(*t);
+        for (const char* table : schema::kTempItemLinks)
+            AttachTable(db, itemDbPath, table);
+        createQueries(db, schema::kTempItemQueries, std::size(schema::kTempItemQueries));
+    });
+}
+
+void MergeTempItems(const QString& tempPath) {
+    Database db = Database::open(tempPath);
+    db.execute("qAddUpdateAlterKeys");
+    db.execute("qAddUpdateAlterPrices");
+    const QString priceMerge = db.querySql("qAddUpdatePriceList");
+    for (int n = 1; n <= 10; ++n)
+        db.execute(priceMerge + " Where tTempPriceList.PriceList = " + QString::number(n));
+}
+
+QString CreateLogDatabase(const QString& path) {
+    return created(path, [&] {
+        removeExisting(path);
+        Database db = Database::create(path);
+        db.createTable(schema::stockLog());
+    });
+}
+
+void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrices,
+                     const std::function<void(const QString&)>& showMessage) {
+    Database db = Database::open(itemDbPath);
+    if (!cleanItems) return;
+    if (showMessage) showMessage(GetCaption(42));
+    db.execute("DELETE * FROM tItems");
+    if (alterPrices) db.execute("Delete * From tAlterPrices");
+}
+
+bool UpgradeItemDatabase(const QString& folder) {
+    const QString path = inFolder(folder, kItemDatabaseFile);
+    if (!QFileInfo::exists(path)) return true;
+    return !AddAccountTables(path).isEmpty();
+}
+
+}  // namespace etq::db

@@ -1,0 +1,51 @@
+#pragma once
+
+#include <QString>
+#include <functional>
+
+#include "jet/database.h"
+
+// The creation routines of the component's databases. Each creating routine returns the path
+// it made, or an empty text after it has reported the failure (the engine's description,
+// caption 1 as title, the critical icon). A half-built file stays where it is; the next
+// creation deletes it first.
+namespace etq::db {
+
+// The working database: the document tables, links to the permanent tables of the document
+// and item databases (and of the log database when logDbPath is not empty), and its queries.
+QString CreateDocDatabase(const QString& docRefPath, const QString& itemDbPath,
+                          const QString& workPath, const QString& logDbPath);
+
+// Links table tableName of the file sourcePath into db. Failures go to the caller.
+void AttachTable(jet::Database& db, const QString& sourcePath, const QString& tableName);
+
+// The item database with tItems, tAlterKeys, tAlterPrices and its queries. Replaces a file
+// that is there: its items, alternate keys and special prices are lost.
+QString CreateItemDatabase(const QString& path);
+
+// Adds tAccountDef and tPriceList to an item database (the upgrade of an older file).
+QString AddAccountTables(const QString& path);
+
+// The temporary items database: staging tables, links to the item database at itemDbPath, and
+// the merge queries.
+QString CreateTempItemDatabase(const QString& tempPath, const QString& itemDbPath);
+
+// Merges the staged rows into the item database: alternate keys, special prices, then price
+// lists 1 to 10, one statement each. Rows staged with another price list number stay unmerged.
+// Does not report: a failing statement throws to the caller, and what ran before it stays.
+void MergeTempItems(const QString& tempPath);
+
+// The log database with tStockLog.
+QString CreateLogDatabase(const QString& path);
+
+// Empties the item table before an import when `cleanItems` is set, and the special prices
+// too when `alterPrices` is set as well; shows caption 42 through showMessage first. Does not
+// report: a failure throws to the caller.
+void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrices,
+                     const std::function<void(const QString&)>& showMessage);
+
+// What the upgrade button does with the database folder: adds the account tables to an
+// existing item database. True when there is nothing to upgrade or the upgrade worked.
+bool UpgradeItemDatabase(const QString& folder);
+
+}  // namespace etq::db
