@@ -16,7 +16,10 @@
 #include <set>
 
 #include "import/logon_dialog.h"
+#include "shell/bound_grid_model.h"
+#include "shell/captions.h"
 #include "shell/card_controller.h"
+#include "shell/component.h"
 #include "shell/qt_file_chooser.h"
 #include "shell/surface_controls.h"
 
@@ -216,6 +219,34 @@ MainCard::MainCard(QWidget* parent)
         LogonDialog dialog(this);
         dialog.exec();
     });
+    connectDocTypeGrid();
+    connectParts(*controller_, *this);
+}
+
+// The document type grid of tab 6 is bound to qSelectDocTypes of the document database: its
+// scan and draft boxes write straight through to tDocTypes.
+void MainCard::connectDocTypeGrid() {
+    auto* view = findChild<QTableView*>(QStringLiteral("VSDocTypes"));
+    if (!view) return;
+    docTypes_ = new BoundGridModel(this);
+    view->setModel(docTypes_);
+    CardHooks& hooks = controller_->hooks();
+    hooks.showDocTypes = [this, view](const QString& documentDatabase) {
+        docTypes_->setDatabaseName(documentDatabase);
+        docTypes_->setRecordSource(QStringLiteral("qSelectDocTypes"));
+        docTypes_->refresh();
+        // Column 1 left-centred; the headers are captions 7, 27 and 28.
+        docTypes_->setAlignment(0, BoundGridModel::alignmentOfCode(1));
+        const int captions[] = {7, 27, 28};
+        for (int column = 0; column < 3 && column < docTypes_->columnCount(); ++column)
+            docTypes_->setHeader(column, GetCaption(captions[column]));
+        view->resizeColumnsToContents();
+    };
+    hooks.markAllDocTypes = [this](bool scan) {
+        for (int row = 0; row < docTypes_->rowCount(); ++row)
+            docTypes_->setData(docTypes_->index(row, 1), scan ? Qt::Checked : Qt::Unchecked,
+                               Qt::CheckStateRole);
+    };
 }
 
 MainCard::~MainCard() = default;

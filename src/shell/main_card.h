@@ -19,6 +19,8 @@ class QtFileChooser;
 // and the progress bar below it. Every control is a widget whose objectName is its name
 // ("OptOLE(3)" for array elements), carrying its English caption in the property "Tag". The
 // surface reads right to left. Clicks and changes go to the card's CardController.
+class BoundGridModel;
+
 class MainCard : public QWidget, public Surface {
     Q_OBJECT
 
@@ -43,12 +45,14 @@ class MainCard : public QWidget, public Surface {
     void buildControls();
     QWidget* makeWidget(const ControlSpec& spec, QWidget* parent);
     void connectEvents(QWidget* widget, const QString& name, int index);
+    void connectDocTypeGrid();
 
     QTabWidget* mainTab_ = nullptr;
     std::vector<std::unique_ptr<WidgetControl>> controls_;
     QHash<QString, WidgetControl*> byName_;
     std::unique_ptr<QtFileChooser> chooser_;
     std::unique_ptr<CardController> controller_;
+    BoundGridModel* docTypes_ = nullptr;
 };
 
 }  // namespace etq
