@@ -3,15 +3,17 @@
 # docs/screenshots/tab-0.png .. tab-7.png. Runs the window under a virtual X display.
 set -euo pipefail
 cd "$(dirname "$0")/.."
-tools/build.sh etiquon
+tools/build.sh etiquon etiquon-cli document_database
 build="${ETIQUON_BUILD_DIR:-build}"
 out="${1:-docs/screenshots}"
 
 # A settings folder of its own, so the pictures show the defaults; paths show the user's own.
 scratch="$(mktemp -d)"
 trap 'rm -rf "$scratch"' EXIT
-mkdir -p "$scratch/config" "$scratch/runtime"
+mkdir -p "$scratch/config" "$scratch/runtime" "$scratch/share"
 chmod 700 "$scratch/runtime"
-XDG_CONFIG_HOME="$scratch/config" XDG_RUNTIME_DIR="$scratch/runtime" \
-    xvfb-run -a "$build/src/app/etiquon" --screenshots "$out"
+export XDG_CONFIG_HOME="$scratch/config" XDG_RUNTIME_DIR="$scratch/runtime" XDG_DATA_HOME="$scratch/share"
+# The default database folder, prepared as a first run leaves it: tab 6 lists its document types.
+"$build/src/app/etiquon-cli" init-db --db "$XDG_DATA_HOME/Etiquon" >/dev/null
+xvfb-run -a "$build/src/app/etiquon" --screenshots "$out"
 echo "screenshots: $(ls "$out"/tab-*.png | wc -l) pictures in $out"
