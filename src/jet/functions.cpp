@@ -70,16 +70,23 @@ void registerOne(sqlite3* db, const char* name, int argc,
 
 // --- operators ------------------------------------------------------------------------------
 
-// + joins two texts and adds anything else; a Null on either side gives Null.
-void add(sqlite3_context* ctx, int, sqlite3_value** argv) {
+// The arithmetic operators: Null on either side gives Null, texts count when they are numbers.
+// `op` returns false after it has set an error.
+template <typename Op>
+void arithmetic(sqlite3_context* ctx, sqlite3_value** argv, Op op) {
     if (isNull(argv[0]) || isNull(argv[1])) return sqlite3_result_null(ctx);
-    if (isText(argv[0]) && isText(argv[1]))
-        return resultText(ctx, arg(argv[0]).toString() + arg(argv[1]).toString());
     const auto a = number(ctx, argv[0]);
     if (!a) return;
     const auto b = number(ctx, argv[1]);
     if (!b) return;
-    resultNumber(ctx, *a + *b);
+    op(*a, *b);
+}
+
+// + joins two texts and adds anything else; a Null on either side gives Null.
+void add(sqlite3_context* ctx, int, sqlite3_value** argv) {
+    if (isText(argv[0]) && isText(argv[1]))
+        return resultText(ctx, arg(argv[0]).toString() + arg(argv[1]).toString());
+    arithmetic(ctx, argv, [ctx](double a, double b) { resultNumber(ctx, a + b); });
 }
 
 // & always joins texts; a Null side counts as the empty text.
@@ -89,45 +96,31 @@ void concat(sqlite3_context* ctx, int, sqlite3_value** argv) {
 }
 
 void divide(sqlite3_context* ctx, int, sqlite3_value** argv) {
-    if (isNull(argv[0]) || isNull(argv[1])) return sqlite3_result_null(ctx);
-    const auto a = number(ctx, argv[0]);
-    if (!a) return;
-    const auto b = number(ctx, argv[1]);
-    if (!b) return;
-    if (*b == 0) return resultError(ctx, "Division by zero.");
-    resultNumber(ctx, *a / *b);
+    arithmetic(ctx, argv, [ctx](double a, double b) {
+        if (b == 0) return resultError(ctx, "Division by zero.");
+        resultNumber(ctx, a / b);
+    });
 }
 
 // \ and Mod round both sides to whole numbers first.
 void intDivide(sqlite3_context* ctx, int, sqlite3_value** argv) {
-    if (isNull(argv[0]) || isNull(argv[1])) return sqlite3_result_null(ctx);
-    const auto a = number(ctx, argv[0]);
-    if (!a) return;
-    const auto b = number(ctx, argv[1]);
-    if (!b) return;
-    const qint64 d = vb::roundHalfEven(*b);
-    if (d == 0) return resultError(ctx, "Division by zero.");
-    sqlite3_result_int64(ctx, vb::roundHalfEven(*a) / d);
+    arithmetic(ctx, argv, [ctx](double a, double b) {
+        const qint64 d = vb::roundHalfEven(b);
+        if (d == 0) return resultError(ctx, "Division by zero.");
+        sqlite3_result_int64(ctx, vb::roundHalfEven(a) / d);
+    });
 }
 
 void modulo(sqlite3_context* ctx, int, sqlite3_value** argv) {
-    if (isNull(argv[0]) || isNull(argv[1])) return sqlite3_result_null(ctx);
-    const auto a = number(ctx, argv[0]);
-    if (!a) return;
-    const auto b = number(ctx, argv[1]);
-    if (!b) return;
-    const qint64 d = vb::roundHalfEven(*b);
-    if (d == 0) return resultError(ctx, "Division by zero.");
-    sqlite3_result_int64(ctx, vb::roundHalfEven(*a) % d);
+    arithmetic(ctx, argv, [ctx](double a, double b) {
+        const qint64 d = vb::roundHalfEven(b);
+        if (d == 0) return resultError(ctx, "Division by zero.");
+        sqlite3_result_int64(ctx, vb::roundHalfEven(a) % d);
+    });
 }
 
 void power(sqlite3_context* ctx, int, sqlite3_value** argv) {
-    if (isNull(argv[0]) || isNull(argv[1])) return sqlite3_result_null(ctx);
-    const auto a = number(ctx, argv[0]);
-    if (!a) return;
-    const auto b = number(ctx, argv[1]);
-    if (!b) return;
-    resultNumber(ctx, std::pow(*a, *b));
+    arithmetic(ctx, argv, [ctx](double a, double b) { resultNumber(ctx, std::pow(a, b)); });
 }
 
 // Like: * any run, ? one character, # one digit, [abc] [!abc] [a-z] one of a set; texts

@@ -37,6 +37,24 @@ bool isNameChar(QChar c) {
     return c.isLetterOrNumber() || c == u'_' || c == u'$';
 }
 
+// The text literal that opens at `start` (with ' or "; a doubled quote stands for itself):
+// its value, and the position after its closing quote, or -1 when it does not close.
+qsizetype readQuoted(const QString& text, qsizetype start, QString* value) {
+    const QChar quote = text[start];
+    value->clear();
+    for (qsizetype j = start + 1; j < text.size(); ++j) {
+        if (text[j] != quote) {
+            *value += text[j];
+        } else if (j + 1 < text.size() && text[j + 1] == quote) {
+            *value += quote;
+            ++j;
+        } else {
+            return j + 1;
+        }
+    }
+    return -1;
+}
+
 // #m/d/yyyy# or #yyyy-mm-dd# [time], as the engine reads date literals.
 double parseDateLiteral(const QString& text, const QString& sql) {
     const QString t = text.trimmed();
@@ -93,24 +111,11 @@ QList<Token> tokenize(const QString& sql) {
             t.number = t.text.toDouble();
             i = j;
         } else if (c == u'\'' || c == u'"') {
-            QString value;
-            qsizetype j = i + 1;
-            for (;; ++j) {
-                if (j >= n) syntaxError("missing closing quote", sql);
-                if (sql[j] == c) {
-                    if (j + 1 < n && sql[j + 1] == c) {
-                        value += c;
-                        ++j;
-                        continue;
-                    }
-                    break;
-                }
-                value += sql[j];
-            }
+            const qsizetype end = readQuoted(sql, i, &t.value);
+            if (end < 0) syntaxError("missing closing quote", sql);
             t.kind = Token::String;
-            t.text = sql.mid(i, j + 1 - i);
-            t.value = value;
-            i = j + 1;
+            t.text = sql.mid(i, end - i);
+            i = end;
         } else if (c == u'[') {
             const qsizetype j = sql.indexOf(u']', i + 1);
             if (j < 0) syntaxError("missing ]", sql);
@@ -947,21 +952,10 @@ QString criterionShape(const QString& criterion, QList<QVariant>* literals) {
             i = k;
         } else if (c == u'\'' || c == u'"') {
             QString value;
-            qsizetype j = i + 1;
-            for (; j < n; ++j) {
-                if (criterion[j] == c) {
-                    if (j + 1 < n && criterion[j + 1] == c) {
-                        value += c;
-                        ++j;
-                        continue;
-                    }
-                    break;
-                }
-                value += criterion[j];
-            }
+            const qsizetype end = readQuoted(criterion, i, &value);
             literals->append(value);
             shape += u'\x01';
-            i = j + 1;
+            i = end < 0 ? n : end;
         } else if (c.isDigit() || (c == u'.' && i + 1 < n && criterion[i + 1].isDigit()) ||
                    c == u'#') {
             // Numbers and dates: let the tokenizer read exactly one token here.

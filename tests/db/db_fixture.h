@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include "support/jet_rows.h"
 #include "support/qt_print.h"
 
 #include <QFile>
@@ -36,19 +37,8 @@ class DbFolderTest : public ::testing::Test {
                                  withLog ? path(kLogDatabaseFile) : QString());
     }
 
-    // Rows as "a|b|c" texts, values written as the component writes them.
     static QStringList rows(jet::Database& db, const QString& sql) {
-        QStringList out;
-        jet::Recordset rs = db.openRecordset(sql);
-        for (; !rs.eof(); rs.moveNext()) {
-            QStringList cells;
-            for (int i = 0; i < rs.fieldCount(); ++i) {
-                const QVariant v = rs.value(i);
-                cells << (v.isNull() ? QString("Null") : vb::toText(v));
-            }
-            out << cells.join(u'|');
-        }
-        return out;
+        return etq::test::jetRows(db, sql);
     }
 
     QTemporaryDir dir;

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include "support/jet_rows.h"
 #include "support/qt_print.h"
 
 #include <QTemporaryDir>
@@ -36,19 +37,8 @@ class JetTest : public ::testing::Test {
     QString file(const QString& name) const { return dir_.filePath(name); }
     Database create(const QString& name) { return Database::create(file(name)); }
 
-    // Rows of a query as text, "a|b|c" per row, for compact expectations.
     static QStringList rows(Database& db, const QString& sql) {
-        QStringList out;
-        Recordset rs = db.openRecordset(sql);
-        for (; !rs.eof(); rs.moveNext()) {
-            QStringList cells;
-            for (int i = 0; i < rs.fieldCount(); ++i) {
-                const QVariant v = rs.value(i);
-                cells << (v.isNull() ? QString("Null") : vb::toText(v));
-            }
-            out << cells.join(u'|');
-        }
-        return out;
+        return etq::test::jetRows(db, sql);
     }
 
     QTemporaryDir dir_;
