@@ -49,6 +49,8 @@ void printError(const QString& message) {
 int runConfig(const QStringList& args);  // cli_config.cpp
 int runInitDb(const QStringList& args);  // cli_db.cpp
 int runUpgrade(const QStringList& args);  // cli_db.cpp
+int runMarkItems(const QStringList& args);  // cli_print.cpp
+int runPrintItems(const QStringList& args);  // cli_print.cpp
 
 namespace {
 
@@ -62,6 +64,10 @@ const Command kCommands[] = {
      "read and write the settings of the control", runConfig},
     {"init-db", "--db DIR", "prepare a database folder for a first run", runInitDb},
     {"upgrade", "--db DIR", "add the account tables to an older item database", runUpgrade},
+    {"mark-items", "--db DIR (--all | --none | KEY...) [--copies N]",
+     "mark items for printing and set their copies", runMarkItems},
+    {"print-items", "--db DIR [--open]", "print the marked items' labels; prints the page's path",
+     runPrintItems},
 };
 
 void printHelp() {

@@ -29,16 +29,18 @@ bool isPadding(char c) {
 
 DbfError::DbfError(QString message) : message_(std::move(message)), utf8_(message_.toUtf8()) {}
 
-DbfFile::DbfFile(const QString& path) : path_(path), file_(std::make_unique<QFile>(path)) {
-    if (!file_->open(QIODevice::ReadOnly))
-        throw DbfError(QStringLiteral("Cannot open %1: %2").arg(path_, file_->errorString()));
-    const qint64 size = file_->size();
+DbfFile::DbfFile(const QString& path) : path_(path) {
+    QFile file(path_);
+    if (!file.open(QIODevice::ReadOnly))
+        throw DbfError(QStringLiteral("Cannot open %1: %2").arg(path_, file.errorString()));
+    contents_ = file.readAll();
+    if (file.error() != QFileDevice::NoError)
+        throw DbfError(QStringLiteral("Cannot read %1: %2").arg(path_, file.errorString()));
+    // What was read is what counts: a file the host shortens meanwhile fails the checks below.
+    const qint64 size = contents_.size();
     if (size < kFileHeaderSize)
         fail(QStringLiteral("it is %1 bytes long, shorter than a dBASE header (32 bytes)")
                  .arg(size));
-    data_ = reinterpret_cast<const char*>(file_->map(0, size));
-    if (!data_)
-        throw DbfError(QStringLiteral("Cannot read %1: %2").arg(path_, file_->errorString()));
     readHeader(size);
     readFieldDescriptors();
 }
@@ -52,9 +54,9 @@ void DbfFile::fail(const QString& what) const {
 }
 
 void DbfFile::readHeader(qint64 fileSize) {
-    recordCount_ = u32At(data_ + 4);
-    headerLength_ = u16At(data_ + 8);
-    recordLength_ = u16At(data_ + 10);
+    recordCount_ = u32At(contents_.constData() + 4);
+    headerLength_ = u16At(contents_.constData() + 8);
+    recordLength_ = u16At(contents_.constData() + 10);
     if (headerLength_ < kFileHeaderSize + 1)
         fail(QStringLiteral("the header length %1 is less than 33 bytes").arg(headerLength_));
     if (headerLength_ > fileSize)
@@ -76,9 +78,9 @@ void DbfFile::readHeader(qint64 fileSize) {
 void DbfFile::readFieldDescriptors() {
     int offset = 1;
     for (int pos = kFileHeaderSize;
-         pos + kDescriptorSize <= headerLength_ && data_[pos] != kHeaderTerminator;
+         pos + kDescriptorSize <= headerLength_ && contents_[pos] != kHeaderTerminator;
          pos += kDescriptorSize) {
-        const char* d = data_ + pos;
+        const char* d = contents_.constData() + pos;
         DbfField field;
         field.name = decode1255(QByteArrayView(d, qstrnlen(d, 11)));
         field.type = d[11];

@@ -1,12 +1,10 @@
 #pragma once
 
+#include <QByteArray>
 #include <QByteArrayView>
 #include <QList>
 #include <QString>
 #include <exception>
-#include <memory>
-
-class QFile;
 
 namespace etq {
 
@@ -40,8 +38,10 @@ struct DbfField {
 };
 
 // A host dBASE file opened for reading. The host's readers take fields at fixed offsets, so
-// the field descriptors are parsed for inspection only. The file is memory-mapped: host files
-// can be tens of megabytes and are read record by record.
+// the field descriptors are parsed for inspection only. The whole file is read into memory
+// when it is opened (one read of a few tens of megabytes at most): the host package may
+// rewrite its files while we read them, and a mapped file cut short under us would kill the
+// process on the next access instead of failing cleanly.
 //
 // Everything is checked when the file is opened (the header against the file's size) and on
 // every access (the field against the record length, the record against the record count);
@@ -66,8 +66,8 @@ class DbfFile {
     // throws DbfError naming `what` (the layout, e.g. "item record").
     void requireRecordLength(int length, const QString& what) const;
 
-    // Record access. `record` counts from 0. Bytes returned point into the mapped file and
-    // stay valid while this object lives.
+    // Record access. `record` counts from 0. Bytes returned point into the file's contents
+    // and stay valid while this object lives.
     QByteArrayView record(qint64 record) const;
     bool isDeleted(qint64 record) const;
     // Windows-1255 text, trimmed of leading and trailing blanks (spaces, and the NUL bytes
@@ -96,13 +96,12 @@ class DbfFile {
         if (record < 0 || record >= recordCount_ || offset < 0 || width < 0 ||
             offset > recordLength_ - width)
             failAccess(record, offset, width);
-        return data_ + headerLength_ + record * recordLength_ + offset;
+        return contents_.constData() + headerLength_ + record * recordLength_ + offset;
     }
     [[noreturn]] void failAccess(qint64 record, int offset, int width) const;
 
     QString path_;
-    std::unique_ptr<QFile> file_;
-    const char* data_ = nullptr;
+    QByteArray contents_;
     qint64 recordCount_ = 0;
     int headerLength_ = 0;
     int recordLength_ = 0;

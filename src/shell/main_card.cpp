@@ -15,7 +15,9 @@
 #include <QToolButton>
 #include <set>
 
+#include "dialogs/select_item_window.h"
 #include "import/logon_dialog.h"
+#include "platform/qt_browser.h"
 #include "shell/bound_grid_model.h"
 #include "shell/captions.h"
 #include "shell/card_controller.h"
@@ -220,6 +222,9 @@ MainCard::MainCard(QWidget* parent)
         dialog.exec();
     });
     connectDocTypeGrid();
+    connectItemSelection(*controller_, *this, this);
+    static DesktopPageViewer desktopViewer;
+    setPageViewer(&desktopViewer);
     connectParts(*controller_, *this);
 }
 

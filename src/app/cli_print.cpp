@@ -1,0 +1,130 @@
+// etiquon-cli mark-items and print-items: the item selection window and the item print button
+// without windows.
+#include <QTextStream>
+
+#include "app/cli_command.h"
+#include "dialogs/item_selection.h"
+#include "jet/database.h"
+#include "jet/error.h"
+#include "jet/recordset.h"
+#include "platform/browser.h"
+#include "platform/messages.h"
+#include "print/label_query.h"
+#include "shell/bound_grid_model.h"
+#include "shell/card_controller.h"
+#include "shell/component.h"
+#include "shell/memory_surface.h"
+
+namespace etq::cli {
+
+namespace {
+
+// The control on the headless surface, started as the window starts: settings groups and the
+// built-in label definition from the store of the SettingID's application name.
+struct HeadlessCard {
+    explicit HeadlessCard(const QString& settingId) : controller(surface) {
+        connectParts(controller, surface);
+        controller.InitProperties(settingId);
+    }
+    MemorySurface surface;
+    CardController controller;
+};
+
+// Writes messages on stderr like the plain sink, and remembers whether one was a failure.
+class CountingSink : public MessageSink {
+  public:
+    CountingSink() { setMessageSink(this); }
+    ~CountingSink() override { setMessageSink(nullptr); }
+    MsgAnswer show(const Message& message) override {
+        if (message.icon == MsgIcon::Critical) ++failures;
+        return stderrSink_.show(message);
+    }
+    int failures = 0;
+
+  private:
+    StderrMessageSink stderrSink_;
+};
+
+int markUsage() {
+    printError(
+        "usage: etiquon-cli mark-items --db DIR (--all | --none | KEY...) [--copies N] "
+        "[--setting-id N]");
+    return 2;
+}
+
+}  // namespace
+
+int runMarkItems(const QStringList& arguments) {
+    QStringList args = arguments;
+    const CommonOptions common = takeCommonOptions(args);
+    const QString folder = takeOption(args, "--db");
+    const QString copies = takeOption(args, "--copies");
+    const bool all = takeFlag(args, "--all");
+    const bool none = takeFlag(args, "--none");
+    if (folder.isEmpty() || (all && none) || ((all || none) && !args.isEmpty()) ||
+        (!all && !none && args.isEmpty() && copies.isEmpty()))
+        return markUsage();
+    for (const QString& key : args)
+        if (key.startsWith("--")) return markUsage();
+    if (!copies.isEmpty() && (copies.toInt() <= 0 || copies.toInt() > 255)) {
+        printError(QString("--copies takes a whole number from 1 to 255, not '%1'").arg(copies));
+        return 2;
+    }
+
+    HeadlessCard card(common.settingId);
+    const QString filter = ItemKeyRangeCondition(card.surface.control("txtFromItem").text(),
+                                                 card.surface.control("txtToItem").text());
+    BoundGridModel grid;
+    ItemSelection selection(grid, filter);
+    QTextStream out(stdout);
+    try {
+        selection.open(folder, 0, 0);
+    } catch (const jet::JetError& e) {
+        printError(e.description());
+        return 1;
+    }
+    if (all || none) selection.markAll(all);
+    int missing = 0;
+    for (const QString& key : args) {
+        const int row = selection.findByKey(key);
+        if (row < 0) {
+            printError(QString("no item whose key begins with '%1'").arg(key));
+            ++missing;
+            continue;
+        }
+        out << "marked " << grid.cell(row, ItemSelection::kKeyColumn - 1).toString() << ' '
+            << grid.cell(row, ItemSelection::kNameColumn - 1).toString() << '\n';
+    }
+    if (!copies.isEmpty()) selection.setCopies(copies);
+    if (!selection.lastError().isEmpty()) {
+        printError(selection.lastError());
+        return 1;
+    }
+
+    int marked = 0;
+    for (int row = 0; row < selection.rowCount(); ++row)
+        if (grid.cell(row, ItemSelection::kMarkColumn - 1).toBool()) ++marked;
+    out << marked << " of " << selection.rowCount() << " items marked for printing" << Qt::endl;
+    return missing ? 1 : 0;
+}
+
+int runPrintItems(const QStringList& arguments) {
+    QStringList args = arguments;
+    const CommonOptions common = takeCommonOptions(args);
+    const QString folder = takeOption(args, "--db");
+    const bool open = takeFlag(args, "--open");
+    if (folder.isEmpty() || !args.isEmpty()) {
+        printError("usage: etiquon-cli print-items --db DIR [--open] [--setting-id N]");
+        return 2;
+    }
+    CountingSink sink;
+    HeadlessPageViewer viewer(open);
+    setPageViewer(&viewer);
+    HeadlessCard card(common.settingId);
+    card.surface.control("txtDBPath").setText(folder);
+    card.controller.click("cmdPrintItmes");
+    setPageViewer(nullptr);
+    return sink.failures ? 1 : 0;
+}
+
+}  // namespace etq::cli

@@ -1,0 +1,110 @@
+#include "import/host_reading.h"
+
+#include <limits>
+#include <optional>
+
+#include "db/file_names.h"
+#include "jet/error.h"
+#include "jet/vb.h"
+#include "platform/messages.h"
+#include "shell/captions.h"
+#include "shell/surface.h"
+
+namespace etq::hostread {
+
+namespace {
+
+QString latin1(std::string_view text) {
+    return QString::fromLatin1(text.data(), qsizetype(text.size()));
+}
+
+template <class Whole>
+Whole wholeNumber(const DbfFile& file, qint64 record, const host::HostField& field,
+                  std::optional<Whole> (*convert)(const QVariant&)) {
+    const QString text = file.text(record, field);
+    if (const std::optional<Whole> value = convert(text)) return *value;
+    throw HostValueError(
+        QStringLiteral("%1, record %2: the field %3 holds \"%4\", which is not a whole number "
+                       "from %5 to %6")
+            .arg(file.path())
+            .arg(record + 1)
+            .arg(latin1(field.name), text)
+            .arg(std::numeric_limits<Whole>::min())
+            .arg(std::numeric_limits<Whole>::max()));
+}
+
+}  // namespace
+
+QString hostFilePath(const QString& companyFolder, const host::HostLayout& layout) {
+    return db::inFolder(companyFolder, latin1(layout.fileName));
+}
+
+DbfFile openHostFile(const QString& path, const host::HostLayout& layout) {
+    DbfFile file(path);
+    host::requireLayout(file, layout);
+    return file;
+}
+
+qint16 wholeNumber16(const DbfFile& file, qint64 record, const host::HostField& field) {
+    return wholeNumber<qint16>(file, record, field, &vb::toInteger);
+}
+
+qint32 wholeNumber32(const DbfFile& file, qint64 record, const host::HostField& field) {
+    return wholeNumber<qint32>(file, record, field, &vb::toLong);
+}
+
+QString criterionLiteral(const QString& text, QChar quote) {
+    QString literal = text;
+    literal.replace(quote, QString(2, quote));
+    return quote + literal + quote;
+}
+
+bool updateUnlessDuplicate(jet::Recordset& recordset) {
+    try {
+        recordset.update();
+        return true;
+    } catch (const jet::JetError& e) {
+        if (e.number() != jet::err::kDuplicateKey) throw;
+        recordset.cancelUpdate();
+        return false;
+    }
+}
+
+std::optional<qint16> selectedNumber(const ControlRef& combo) {
+    if (combo.listIndex() < 0) return std::nullopt;
+    const int data = combo.selectedItemData();
+    if (const auto number = vb::toInteger(data)) return number;
+    jet::fail(jet::err::kOverflow,
+              QStringLiteral("The entry chosen in %1 stands for %2, beyond a 16-bit number.")
+                  .arg(combo.name())
+                  .arg(data));
+}
+
+bool isChecked(const Surface& surface, const QString& name) {
+    return surface.control(name).value().toInt() == 1;
+}
+
+void reportFailure(const std::exception& failure) {
+    showCritical(QString::fromUtf8(failure.what()), GetCaption(1));
+}
+
+KeptWrites::~KeptWrites() {
+    if (!open_) return;
+    // The reader is on its way out with a failure it reports itself. Keep what it wrote; should
+    // even that fail, nothing of the transaction stays, so no row is left half-written.
+    try {
+        db_.commitTrans();
+    } catch (const std::exception&) {
+        try {
+            db_.rollback();
+        } catch (const std::exception&) {
+        }
+    }
+}
+
+void KeptWrites::commit() {
+    open_ = false;
+    db_.commitTrans();
+}
+
+}  // namespace etq::hostread

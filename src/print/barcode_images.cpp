@@ -1,0 +1,115 @@
+#include "print/barcode_images.h"
+
+#include "jet/database.h"
+#include "jet/recordset.h"
+#include "jet/vb.h"
+#include "platform/barcode_image.h"
+#include "platform/user_paths.h"
+
+namespace etq {
+
+namespace {
+
+// The designer's list of symbologies, in list order, and the library's code for each.
+// "CODE-128A" asks for subset A, which libzint cannot force: the library gives it automatic
+// Code 128, which uses subset A wherever the data needs it and decodes to the same text.
+constexpr BarTypeMapping kBarTypes[] = {
+    {bar_type::Code39, false},           // "CODE-39"
+    {bar_type::Code39, true},            // "CODE-39 Ascii"
+    {bar_type::Code128, false},          // "CODE-128"
+    {bar_type::Code128A, false},         // "CODE-128A"
+    {bar_type::Code128B, false},         // "CODE-128B"
+    {bar_type::Ean8, false},             // "EAN-8"
+    {bar_type::Ean13, false},            // "EAN-13"
+    {bar_type::Interleaved2of5, false},  // "Interleaved 2 of 5"
+};
+
+constexpr float kDefaultNarrowBar = 0.01f;
+constexpr float kDefaultWideBarRatio = 2.2f;
+constexpr int kResolution = 200;  // dots per inch
+constexpr int kOn = -1;
+
+int flag(bool on) {
+    return on ? kOn : 0;
+}
+
+// The text a record's value encodes: cut first, then the prefix.
+QString encodedText(const QVariant& value, const LabelBarDef& barDef) {
+    QString text = vb::toText(value);
+    if (barDef.LeftLen > 0) text = text.left(barDef.LeftLen);
+    if (!barDef.LeftPrefix.isEmpty()) text = barDef.LeftPrefix + text;
+    return text;
+}
+
+}  // namespace
+
+QString BmpName(int fldId, qint32 recordNo) {
+    return QStringLiteral("B%1%2.BMP")
+        .arg(fldId, 2, 10, QLatin1Char('0'))
+        .arg(recordNo, 5, 10, QLatin1Char('0'));
+}
+
+BarTypeMapping mapBarType(qint16 barType) {
+    if (barType >= 0 && barType < qint16(std::size(kBarTypes))) return kBarTypes[barType];
+    return {barType, false};
+}
+
+bool WriteBarcodeBitmap(const QString& text, const QString& fileName, LabelBarDef& barDef,
+                        BarcodeImage& instance) {
+    instance.SetUnit(0);
+    instance.SetBarType(barDef.BarType);
+    instance.SetData(text);
+    instance.SetDesc(text);
+    if (barDef.DimX <= 0) barDef.DimX = kDefaultNarrowBar;
+    instance.SetDimX(barDef.DimX);
+    if (barDef.WideBarRatio <= 0) barDef.WideBarRatio = kDefaultWideBarRatio;
+    instance.SetWideBarRatio(barDef.WideBarRatio);
+    instance.SetBarHeight(barDef.BarHeight);
+    instance.SetHoriAlign(1);
+    instance.SetVertAlign(1);
+    instance.SetRotation(0);
+    instance.SetC128User(flag(barDef.C128User));
+    instance.SetC39Ascii(flag(barDef.C39Ascii));
+    instance.SetCheckDigit(flag(barDef.CheckDigit));
+    instance.SetMatchDesc(0);
+    instance.SetMatchFrame(0);
+    instance.SetMultiLine(0);
+    instance.SetShowDesc(flag(barDef.ShowDesc));
+    instance.SetUPCEUser(0);
+    instance.SetUserResoX(kResolution);
+    instance.SetUserResoY(kResolution);
+    return instance.OutputBitmap(fileName);
+}
+
+BarcodeRun MakeBarcodeImages(const QString& folder, const QString& fieldName, int fldId,
+                             const QString& dbName, const QString& sql, LabelBarDef barDef) {
+    BarcodeRun run;
+    jet::Database db = jet::Database::open(dbName);
+    jet::Recordset rs = db.openRecordset(sql);
+    if (rs.bof() && rs.eof()) return run;
+    const int column = rs.fieldIndex(fieldName);
+    if (column < 0)
+        jet::fail(jet::err::kItemNotFound,
+                  QStringLiteral("The label query has no column %1").arg(fieldName));
+
+    const BarTypeMapping mapping = mapBarType(barDef.BarType);
+    barDef.BarType = qint16(mapping.libraryCode);
+    if (mapping.fullAscii) barDef.C39Ascii = true;
+
+    BarcodeImage instance;
+    for (; !rs.eof(); rs.moveNext()) {
+        ++run.records;
+        const QVariant value = rs.value(column);
+        if (value.isNull() || (value.typeId() == QMetaType::QString && value.toString().isEmpty()))
+            continue;
+        const QString name = joinPath(folder, BmpName(fldId, run.records));
+        if (WriteBarcodeBitmap(encodedText(value, barDef), name, barDef, instance))
+            ++run.bitmaps;
+        else
+            run.refused.append(
+                QStringLiteral("%1: %2").arg(BmpName(fldId, run.records), instance.lastError()));
+    }
+    return run;
+}
+
+}  // namespace etq

@@ -1,0 +1,45 @@
+#pragma once
+
+#include <QString>
+#include <QStringList>
+
+#include "print/label_definition.h"
+
+namespace etq {
+
+class BarcodeImage;
+
+// "B", the field slot as at least two digits, the record number (1 = first record of the label
+// query) as at least five digits, ".BMP": B0400001.BMP for slot 4, record 1.
+QString BmpName(int fldId, qint32 recordNo);
+
+// The barcode library's bar type code for the designer's list index in BarType, and whether
+// the index asks for full-ASCII Code 39. An index outside the list is passed as it is.
+struct BarTypeMapping {
+    int libraryCode;
+    bool fullAscii;
+};
+BarTypeMapping mapBarType(qint16 barType);
+
+// What one barcode cell's run made.
+struct BarcodeRun {
+    qint32 records = 0;   // records of the query, each with its record number
+    qint32 bitmaps = 0;   // bitmaps written
+    QStringList refused;  // one line per record whose value the symbology cannot encode
+};
+
+// Writes one bitmap per record of `sql` (opened on the database `dbName`) whose column
+// `fieldName` holds a value, into `folder` under BmpName(fldId, record number). `barDef` is the
+// cell's own copy of the barcode setting; its bar type is mapped here. The text encoded is the
+// value cut to LeftLen characters (when above 0), after LeftPrefix. A value the symbology
+// cannot encode gets no bitmap and a line in `refused`; database failures throw jet::JetError.
+BarcodeRun MakeBarcodeImages(const QString& folder, const QString& fieldName, int fldId,
+                             const QString& dbName, const QString& sql, LabelBarDef barDef);
+
+// Sets up the library instance from `barDef` for `text` and writes the bitmap `fileName`. A
+// narrow bar or ratio of 0 or less becomes 0.01 or 2.2, in barDef too. False when the library
+// refuses; the reason is in instance.lastError().
+bool WriteBarcodeBitmap(const QString& text, const QString& fileName, LabelBarDef& barDef,
+                        BarcodeImage& instance);
+
+}  // namespace etq
