@@ -49,6 +49,7 @@ void printError(const QString& message) {
 int runConfig(const QStringList& args);  // cli_config.cpp
 int runInitDb(const QStringList& args);  // cli_db.cpp
 int runUpgrade(const QStringList& args);  // cli_db.cpp
+int runImportItems(const QStringList& args);  // cli_import.cpp
 int runMarkItems(const QStringList& args);  // cli_print.cpp
 int runPrintItems(const QStringList& args);  // cli_print.cpp
 
@@ -64,6 +65,10 @@ const Command kCommands[] = {
      "read and write the settings of the control", runConfig},
     {"init-db", "--db DIR", "prepare a database folder for a first run", runInitDb},
     {"upgrade", "--db DIR", "add the account tables to an older item database", runUpgrade},
+    {"import-items",
+     "--company DIR --db DIR [--clean] [--price-field N] [--from KEY] [--to KEY] "
+     "[--price-lists] [--special-prices] [--foreign-names] [--copies N]",
+     "read the host's items, prices and currencies into the item database", runImportItems},
     {"mark-items", "--db DIR (--all | --none | KEY...) [--copies N]",
      "mark items for printing and set their copies", runMarkItems},
     {"print-items", "--db DIR [--open]", "print the marked items' labels; prints the page's path",
