@@ -115,12 +115,15 @@ class TerminalProgress {
                                  .arg(QString(done, u'#'), QString(kCells - done, u'.'))
                                  .arg(frame > 0 ? fill * 100 / frame : 0, 3)
                                  .arg(step);
+        if (line == shown_) return;  // the bar moves every few records: draw only changes
+        shown_ = line;
         std::fputs(line.toLocal8Bit().constData(), stderr);
         std::fflush(stderr);
     }
 
     const Surface& surface_;
     bool active_ = false;
+    QString shown_;
 };
 
 }  // namespace
