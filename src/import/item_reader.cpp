@@ -6,7 +6,6 @@
 #include "import/host_reading.h"
 #include "import/public_functions.h"
 #include "jet/error.h"
-#include "jet/vb.h"
 #include "shell/surface.h"
 
 namespace etq {
