@@ -1,7 +1,65 @@
 #!/usr/bin/env bash
-# The main job on the bundled demo company.
+# The main job on the bundled demo company: write the demo company folder, prepare a database
+# folder, import the company's items, mark a dozen of them with two copies each, and print their
+# labels on the built-in label page. The last line names the page; on a desktop it opens in the
+# browser.
+#   tools/demo.sh [--no-build] [--screenshot FILE]
+# The demo keeps its settings under SettingID 90 (~/.config/Etiquon/Etiquon90.ini) and its files
+# in <build>/demo (or $ETIQUON_DEMO_DIR); the page lies in the user's private print folder.
 set -euo pipefail
 cd "$(dirname "$0")/.."
-tools/build.sh
 build="${ETIQUON_BUILD_DIR:-build}"
-"$build/src/app/etiquon-cli" --version
+work="${ETIQUON_DEMO_DIR:-$build/demo}"
+screenshot=""
+no_build=""
+while [ $# -gt 0 ]; do
+    case "$1" in
+        --no-build) no_build=1 ;;
+        --screenshot) screenshot="$2"; shift ;;
+        *) echo "usage: tools/demo.sh [--no-build] [--screenshot FILE]" >&2; exit 2 ;;
+    esac
+    shift
+done
+
+[ -n "$no_build" ] || tools/build.sh etiquon-cli make-demo-company document_database >/dev/null
+cli="$build/src/app/etiquon-cli"
+demo=(--setting-id 90)
+
+rm -rf "$work/company" "$work/db"
+"$build/samples/make-demo-company" "$work/company" >/dev/null
+"$cli" init-db --db "$work/db"
+"$cli" "${demo[@]}" import-items --company "$work/company" --db "$work/db" </dev/null
+echo
+
+# The built-in label: the item's name, its EAN-13 barcode with its digits, and its price; an A4
+# sheet of 4 x 6 labels in item order.
+settings=(
+    "GeneralParams OptOLE3 True" "GeneralParams OptPrinter0 True" "GeneralParams OptPrinter1 False"
+    "0LabelDef UseCell True" "0LabelDef FldID 1" "0LabelDef FontWeight 2" "0LabelDef FontSize 11"
+    "1LabelDef UseCell True" "1LabelDef FldID 4" "1LabelDef ViewType 1"
+    "2LabelDef UseCell True" "2LabelDef FldID 6" "2LabelDef FontSize 12" "2LabelDef Prefix מחיר:"
+    "LabelBar BarType 6" "LabelBar ShowDesc True" "LabelBar UserResoX 0" "LabelBar UserResoY 0"
+)
+for setting in "${settings[@]}"; do
+    # shellcheck disable=SC2086
+    "$cli" "${demo[@]}" config set $setting
+done
+
+"$cli" "${demo[@]}" mark-items --db "$work/db" --none >/dev/null
+"$cli" "${demo[@]}" mark-items --db "$work/db" --copies 2 \
+    10000 10001 10002 10003 10004 KT-1005 10006 10007 10008 10009 10010 10011
+
+open=()
+[ -n "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ] && [ -z "${CI:-}" ] && open=(--open)
+page="$("$cli" "${demo[@]}" print-items --db "$work/db" "${open[@]}" | tail -n 1)"
+
+if [ -n "$screenshot" ]; then
+    profile="$(mktemp -d)"
+    chromium --headless --no-sandbox --disable-gpu --disable-quic --no-first-run \
+        --disable-background-networking --disable-component-update --disable-sync \
+        --user-data-dir="$profile" --hide-scrollbars --window-size=1000,1414 \
+        --screenshot="$(realpath -m "$screenshot")" "file://$page" 2>/dev/null
+    rm -rf "$profile"
+    echo "screenshot: $screenshot"
+fi
+echo "The label page: $page"

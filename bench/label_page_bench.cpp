@@ -1,0 +1,161 @@
+// The built-in label page for 10,000 marked items with one barcode cell: the whole print run
+// (query, 10,000 EAN-13 bitmaps, the page), against zint's own command-line tool making the
+// same 10,000 bitmaps from a batch file. Prints figures; passes or fails nothing.
+//   label_page_bench [LABELS]
+#include <QCoreApplication>
+#include <QDir>
+#include <QElapsedTimer>
+#include <QFile>
+#include <QProcess>
+#include <QTemporaryDir>
+#include <QTextStream>
+#include <cstdio>
+
+#include "db/file_names.h"
+#include "db/local_databases.h"
+#include "jet/database.h"
+#include "jet/recordset.h"
+#include "platform/browser.h"
+#include "platform/print_folder.h"
+#include "platform/settings_store.h"
+#include "print/barcode_images.h"
+#include "print/label_definition.h"
+#include "print/label_page.h"
+#include "print/label_query.h"
+#include "shell/memory_surface.h"
+
+using namespace etq;
+
+namespace {
+
+// A valid EAN-13 with the Israeli prefix.
+QString ean13(int n) {
+    const QString digits = QStringLiteral("729") + QString::number(n).rightJustified(9, u'0');
+    int sum = 0;
+    for (int i = 0; i < 12; ++i)
+        sum += digits[i].digitValue() * (i % 2 ? 3 : 1);
+    return digits + QString::number((10 - sum % 10) % 10);
+}
+
+class SilentViewer : public PageViewer {
+  public:
+    bool showPage(const QString&, QString*) override { return true; }
+};
+
+QString prepareFolder(const QString& folder, int labels) {
+    const QString docDb = db::inFolder(folder, db::kDocDatabaseFile);
+    const QString itemDb = db::inFolder(folder, db::kItemDatabaseFile);
+    const QString workDb = db::inFolder(folder, db::kWorkDatabaseFile);
+    QFile::copy(ETIQUON_DELIVERED_KDB, docDb);
+    QFile::setPermissions(docDb, QFile::ReadOwner | QFile::WriteOwner);
+    if (db::CreateItemDatabase(itemDb).isEmpty() || db::AddAccountTables(itemDb).isEmpty() ||
+        db::CreateDocDatabase(docDb, itemDb, workDb, {}).isEmpty())
+        return {};
+    jet::Database items = jet::Database::open(itemDb);
+    items.beginTrans();
+    jet::Recordset rs = items.openRecordset(QStringLiteral("tItems"));
+    for (int i = 0; i < labels; ++i) {
+        rs.addNew();
+        rs.setValue(QStringLiteral("ItemKey"), QString::number(100000 + i));
+        rs.setValue(QStringLiteral("ItemName"), QStringLiteral("פריט %1").arg(i));
+        rs.setValue(QStringLiteral("BarCode"), ean13(i));
+        rs.setValue(QStringLiteral("Coin"), QStringLiteral("¦"));
+        rs.setValue(QStringLiteral("Price"), 9.9);
+        rs.setValue(QStringLiteral("Copies"), 1);
+        rs.setValue(QStringLiteral("PrintLabel"), true);
+        rs.update();
+    }
+    items.commitTrans();
+    return workDb;
+}
+
+// zint's tool, one bitmap per line of a batch file, as our bitmaps are made: EAN-13 with its
+// check digit given, a 2-pixel module, 80-pixel bars, no text.
+double zintSeconds(const QString& folder, int labels) {
+    const QString input = folder + "/zint-input.txt";
+    QFile file(input);
+    if (!file.open(QIODevice::WriteOnly)) return -1;
+    for (int i = 0; i < labels; ++i)
+        file.write(ean13(i).toLatin1() + '\n');
+    file.close();
+    QDir().mkpath(folder + "/zint");
+    QProcess zint;
+    zint.setWorkingDirectory(folder + "/zint");
+    QElapsedTimer timer;
+    timer.start();
+    zint.start(QStringLiteral("zint"), {"--batch", "--barcode=14", "--scale=1", "--height=40",
+                                        "--notext", "--output=B~~~~~.bmp", "--input=" + input});
+    if (!zint.waitForFinished(-1) || zint.exitCode() != 0) {
+        QTextStream(stderr) << "zint failed: " << zint.readAllStandardError() << Qt::endl;
+        return -1;
+    }
+    return timer.nsecsElapsed() / 1e9;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    // Settings, the print folder and everything else of this run stay in a folder of its own.
+    QTemporaryDir scratch;
+    for (const char* var : {"XDG_CONFIG_HOME", "XDG_RUNTIME_DIR", "XDG_CACHE_HOME"}) {
+        const QString dir = scratch.path() + "/" + var;
+        QDir().mkpath(dir);
+        QFile::setPermissions(dir, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+        qputenv(var, dir.toLocal8Bit());
+    }
+    QCoreApplication app(argc, argv);
+    const int labels = argc > 1 ? QString(argv[1]).toInt() : 10000;
+    QTextStream out(stdout);
+
+    const QString folder = scratch.path() + "/db";
+    QDir().mkpath(folder);
+    const QString workDb = prepareFolder(folder, labels);
+    if (workDb.isEmpty()) return 1;
+
+    MemorySurface surface;
+    surface.control("txtDBPath").setText(folder);
+    surface.control("OptOLE", 3).setValue(true);
+    surface.control("OptPrinter", 0).setValue(true);
+    LabelDefinition def;
+    GetSetLabelDef(LoadLabelDef, def);
+    def.cells[0].UseCell = true;
+    def.cells[0].FldID = 4;  // BarCode
+    def.cells[0].ViewType = 1;
+    def.bar.BarType = 6;  // EAN-13
+    SilentViewer viewer;
+    setPageViewer(&viewer);
+
+    QElapsedTimer timer;
+    timer.start();
+    const QString page = PrintBuiltInLabels(surface, workDb, ItemLabels, def);
+    const double whole = timer.nsecsElapsed() / 1e9;
+    if (page.isEmpty()) return 1;
+    const int bitmaps = int(QDir(printFolder()).entryList({"B*.BMP"}, QDir::Files).size());
+
+    // The two halves of the run, each alone.
+    timer.restart();
+    MakeBarcodeImages(printFolder(), "BarCode", 4, workDb,
+                      BuildLabelQuery(labelQueryInput(surface, ItemLabels, Ascending)), def.bar);
+    const double images = timer.nsecsElapsed() / 1e9;
+    timer.restart();
+    CreateLabFile(surface, page, workDb, ItemLabels, Ascending, def);
+    const double pageOnly = timer.nsecsElapsed() / 1e9;
+
+    const double zint = zintSeconds(scratch.path(), labels);
+    out << "labels: " << labels << ", bitmaps written: " << bitmaps
+        << ", page: " << QFile(page).size() / 1024 << " KiB\n";
+    out << QString("whole print run: %1 s, %2 labels/s\n")
+               .arg(whole, 0, 'f', 3)
+               .arg(labels / whole, 0, 'f', 0);
+    out << QString("  barcode bitmaps alone: %1 s; page alone: %2 s\n")
+               .arg(images, 0, 'f', 3)
+               .arg(pageOnly, 0, 'f', 3);
+    if (zint > 0)
+        out << QString("zint --batch, the same bitmaps: %1 s, %2 bitmaps/s\n")
+                   .arg(zint, 0, 'f', 3)
+                   .arg(labels / zint, 0, 'f', 0)
+            << QString("whole run / zint tool: %1 (target: below 1)\n")
+                   .arg(whole / zint, 0, 'f', 2);
+    out.flush();
+    return 0;
+}

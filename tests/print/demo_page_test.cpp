@@ -1,0 +1,160 @@
+// The main job end to end, as tools/demo.sh runs it on the demo company: the label page it
+// prints is rendered by a real browser (headless Chromium), and its barcode bitmaps are read
+// back by a real decoder (zbarimg).
+#include <gtest/gtest.h>
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QProcess>
+#include <QRegularExpression>
+#include <QTemporaryDir>
+
+#include "jet/database.h"
+#include "jet/recordset.h"
+#include "process_run.h"
+#include "support/qt_print.h"
+#include "support/test_env.h"
+
+namespace etq::print::test {
+namespace {
+
+QString lastLine(const QString& text) {
+    return text.trimmed().split(u'\n').last().trimmed();
+}
+
+// What the browser saw once the page had loaded: the labels that hold a record, and each
+// image's source with its natural width (0 when it did not load).
+struct Rendered {
+    int labels = -1;
+    QList<std::pair<QString, int>> images;
+};
+
+// A copy of the page beside it, with a script that writes what the browser loaded into the
+// page itself; Chromium's --dump-dom returns the page after its load event.
+Rendered renderInChromium(const QString& page) {
+    QFile original(page);
+    if (!original.open(QIODevice::ReadOnly)) return {};
+    QByteArray bytes = original.readAll();
+    const QByteArray script =
+        "<script>window.addEventListener('load', function () {\r\n"
+        "  var out = [];\r\n"
+        "  for (var i = 0; i < document.images.length; i++)\r\n"
+        "    out.push(document.images[i].getAttribute('src') + '=' + "
+        "document.images[i].naturalWidth);\r\n"
+        "  var labels = 0, all = document.querySelectorAll('table.Lab');\r\n"
+        "  for (var j = 0; j < all.length; j++) if (!all[j].querySelector('td[nowrap]')) "
+        "labels++;\r\n"
+        "  var p = document.createElement('pre'); p.id = 'etq-check';\r\n"
+        "  p.textContent = 'labels=' + labels + ';' + out.join(';');\r\n"
+        "  document.body.appendChild(p);\r\n"
+        "});</script>\r\n";
+    bytes.replace("</BODY>", script + "</BODY>");
+    const QString check = QFileInfo(page).path() + "/etq-check.htm";
+    QFile copy(check);
+    if (!copy.open(QIODevice::WriteOnly) || copy.write(bytes) != bytes.size()) return {};
+    copy.close();
+
+    QTemporaryDir profile;
+    const ProcessResult chromium = runProcess(
+        "chromium",
+        {"--headless", "--no-sandbox", "--disable-gpu", "--disable-quic", "--no-first-run",
+         "--disable-background-networking", "--disable-component-update", "--disable-sync",
+         "--user-data-dir=" + profile.path(), "--dump-dom", "file://" + check});
+    QFile::remove(check);
+    const QRegularExpressionMatch match =
+        QRegularExpression(R"(<pre id="etq-check">labels=(\d+);?([^<]*)</pre>)")
+            .match(chromium.out);
+    if (!match.hasMatch()) {
+        ADD_FAILURE() << "no result from chromium: " << chromium.err.left(2000).toStdString();
+        return {};
+    }
+    Rendered rendered;
+    rendered.labels = match.captured(1).toInt();
+    for (const QString& image : match.captured(2).split(u';', Qt::SkipEmptyParts)) {
+        const qsizetype eq = image.lastIndexOf(u'=');
+        rendered.images.append({image.left(eq), image.mid(eq + 1).toInt()});
+    }
+    return rendered;
+}
+
+QString decode(const QString& bitmap) {
+    return runProcess("zbarimg", {"-q", "--raw", bitmap}).out.trimmed();
+}
+
+class DemoPageTest : public ::testing::Test {
+  protected:
+    void SetUp() override {
+        env = QProcessEnvironment::systemEnvironment();
+        env.remove("DISPLAY");  // print only; never open a browser from a test
+        env.remove("WAYLAND_DISPLAY");
+        env.insert("ETIQUON_BUILD_DIR", ETIQUON_BUILD_DIR);
+        env.insert("ETIQUON_DEMO_DIR", work.path());
+    }
+    ProcessResult cli(const QStringList& args) {
+        return runProcess(QString(ETIQUON_BUILD_DIR) + "/src/app/etiquon-cli",
+                          QStringList{"--setting-id", "90"} + args, env);
+    }
+    // The barcodes of the marked items, in item key order.
+    QStringList marked(const char* column) {
+        jet::Database items = jet::Database::open(work.path() + "/db/etqnitm.kdb");
+        QStringList values;
+        jet::Recordset rs = items.openRecordset(
+            QString("SELECT %1 FROM tItems WHERE PrintLabel = True ORDER BY ItemKey").arg(column));
+        for (; !rs.eof(); rs.moveNext())
+            values << rs.value(0).toString();
+        return values;
+    }
+    QTemporaryDir work;
+    QProcessEnvironment env;
+};
+
+TEST_F(DemoPageTest, BrowserShowsEveryLabelAndBarcodeOfTheDemoPage) {
+    const ProcessResult demo =
+        runProcess("bash", {etq::test::sourceDir() + "/tools/demo.sh", "--no-build"}, env);
+    ASSERT_EQ(demo.exitCode, 0) << demo.err.toStdString();
+    const QString line = lastLine(demo.out);
+    ASSERT_TRUE(line.startsWith("The label page: ")) << line.toStdString();
+    const QString page = line.mid(int(sizeof("The label page: ")) - 1);
+    ASSERT_TRUE(QFile::exists(page)) << page.toStdString();
+
+    // Twelve items, two copies each: one full sheet of 4 x 6.
+    const Rendered rendered = renderInChromium(page);
+    EXPECT_EQ(rendered.labels, 24);
+    ASSERT_EQ(rendered.images.size(), 24);
+    for (const auto& [source, width] : rendered.images) {
+        EXPECT_TRUE(source.startsWith("B04")) << source.toStdString();
+        EXPECT_GT(width, 0) << source.toStdString() << " did not load";
+    }
+
+    // The bitmaps read back as the items' EAN-13 barcodes, record by record.
+    const QStringList barcodes = marked("BarCode");
+    ASSERT_EQ(barcodes.size(), 12);
+    const QString folder = QFileInfo(page).path();
+    for (int record = 1; record <= 12; ++record)
+        EXPECT_EQ(decode(QString("%1/B04%2.BMP").arg(folder).arg(record, 5, 10, QChar('0'))),
+                  barcodes[record - 1])
+            << record;
+}
+
+TEST_F(DemoPageTest, Code128BitmapsReadBackAsTheItemKeys) {
+    ASSERT_EQ(
+        runProcess("bash", {etq::test::sourceDir() + "/tools/demo.sh", "--no-build"}, env).exitCode,
+        0);
+    ASSERT_EQ(cli({"config", "set", "LabelBar", "BarType", "2"}).exitCode, 0);  // CODE-128
+    ASSERT_EQ(cli({"config", "set", "1LabelDef", "FldID", "0"}).exitCode, 0);   // ItemKey
+    const ProcessResult print = cli({"print-items", "--db", work.path() + "/db"});
+    ASSERT_EQ(print.exitCode, 0) << print.err.toStdString();
+    const QString folder = QFileInfo(lastLine(print.out)).path();
+    const QStringList keys = marked("ItemKey");
+    ASSERT_EQ(keys.size(), 12);
+    EXPECT_TRUE(keys.contains("KT-1005"));
+    for (int record = 1; record <= 12; ++record)
+        EXPECT_EQ(decode(QString("%1/B00%2.BMP").arg(folder).arg(record, 5, 10, QChar('0'))),
+                  keys[record - 1])
+            << record;
+    EXPECT_EQ(renderInChromium(lastLine(print.out)).labels, 24);
+}
+
+}  // namespace
+}  // namespace etq::print::test
