@@ -1,5 +1,6 @@
 #include "platform/barcode_image.h"
 
+#include "platform/bmp_file.h"
 #include "platform/codepage1255.h"
 
 #include <QFile>
@@ -189,35 +190,42 @@ bool BarcodeImage::OutputBitmap(const QString& path) {
                         .arg(sizeof(symbol_->outfile) - 1)
                         .arg(path));
     }
-    // A bitmap left from an earlier output must not stand in for one that failed.
-    QFile::remove(path);
-
-    const BarType* type = findBarType(settings_.barType);
-    if (!type) return fail(QStringLiteral("Unknown barcode type %1").arg(settings_.barType));
-    if (const QString problem = settingsProblem(settings_); !problem.isEmpty()) {
-        return fail(problem);
+    // A bitmap left from an earlier output must not stand in for one that failed; one that
+    // succeeds overwrites it.
+    const QString problem = writeBitmap(fileName);
+    if (problem.isEmpty()) {
+        lastError_.clear();
+        return true;
     }
+    QFile::remove(path);
+    return fail(problem);
+}
+
+QString BarcodeImage::writeBitmap(const QByteArray& fileName) {
+    const BarType* type = findBarType(settings_.barType);
+    if (!type) return QStringLiteral("Unknown barcode type %1").arg(settings_.barType);
+    if (const QString problem = settingsProblem(settings_); !problem.isEmpty()) return problem;
     const QString& text = settings_.data;
-    if (text.isEmpty()) return fail(QStringLiteral("No data for the %1 barcode").arg(type->name));
+    if (text.isEmpty()) return QStringLiteral("No data for the %1 barcode").arg(type->name);
     Encoding encoding;
     const QString refusal =
         prepareEncoding(*type, text, settings_.checkDigit, settings_.c39Ascii, encoding);
-    if (!refusal.isEmpty()) return fail(QStringLiteral("%1 (data \"%2\")").arg(refusal, text));
+    if (!refusal.isEmpty()) return QStringLiteral("%1 (data \"%2\")").arg(refusal, text);
 
     zint_symbol* symbol = symbol_.get();
     prepareSymbol(symbol, settings_, encoding, fileName);
     const auto* data = reinterpret_cast<const unsigned char*>(encoding.data.constData());
-    if (ZBarcode_Encode(symbol, data, int(encoding.data.size())) >= ZINT_ERROR) {
-        return fail(QStringLiteral("%1 barcode of \"%2\": %3")
-                        .arg(type->name, text, QString::fromUtf8(symbol->errtxt)));
+    if (ZBarcode_Encode(symbol, data, int(encoding.data.size())) >= ZINT_ERROR ||
+        ZBarcode_Buffer(symbol, settings_.rotation) >= ZINT_ERROR) {
+        return QStringLiteral("%1 barcode of \"%2\": %3")
+            .arg(type->name, text, QString::fromUtf8(symbol->errtxt));
     }
-    if (ZBarcode_Print(symbol, settings_.rotation) >= ZINT_ERROR) {
-        QFile::remove(path);
-        return fail(QStringLiteral("Cannot write barcode file %1: %2")
-                        .arg(path, QString::fromUtf8(symbol->errtxt)));
-    }
-    lastError_.clear();
-    return true;
+    // zint's raster, written as the BMP its own output makes, without its per-pixel conversion.
+    QString error;
+    if (!writeMonochromeBmp(fileName, symbol->bitmap, symbol->bitmap_width, symbol->bitmap_height,
+                            &error))
+        return error;
+    return {};
 }
 
 }  // namespace etq

@@ -92,6 +92,8 @@ class BarcodeImage {
     };
 
     bool fail(const QString& reason);
+    // Encodes the current settings and writes the bitmap; the reason when it cannot.
+    QString writeBitmap(const QByteArray& fileName);
 
     BarcodeSettings settings_;
     std::unique_ptr<zint_symbol, SymbolDeleter> symbol_;

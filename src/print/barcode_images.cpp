@@ -6,6 +6,10 @@
 #include "platform/barcode_image.h"
 #include "platform/user_paths.h"
 
+#include <algorithm>
+#include <map>
+#include <thread>
+
 namespace etq {
 
 namespace {
@@ -81,12 +85,13 @@ bool WriteBarcodeBitmap(const QString& text, const QString& fileName, LabelBarDe
     return instance.OutputBitmap(fileName);
 }
 
-BarcodeRun MakeBarcodeImages(const QString& folder, const QString& fieldName, int fldId,
+BarcodeBatch collectBarcodes(const QString& folder, const QString& fieldName, int fldId,
                              const QString& dbName, const QString& sql, LabelBarDef barDef) {
-    BarcodeRun run;
+    BarcodeBatch batch;
+    batch.folder = folder;
     jet::Database db = jet::Database::open(dbName);
     jet::Recordset rs = db.openRecordset(sql);
-    if (rs.bof() && rs.eof()) return run;
+    if (rs.bof() && rs.eof()) return batch;
     const int column = rs.fieldIndex(fieldName);
     if (column < 0)
         jet::fail(jet::err::kItemNotFound,
@@ -95,21 +100,61 @@ BarcodeRun MakeBarcodeImages(const QString& folder, const QString& fieldName, in
     const BarTypeMapping mapping = mapBarType(barDef.BarType);
     barDef.BarType = qint16(mapping.libraryCode);
     if (mapping.fullAscii) barDef.C39Ascii = true;
-
-    BarcodeImage instance;
+    batch.barDef = barDef;
     for (; !rs.eof(); rs.moveNext()) {
-        ++run.records;
+        ++batch.records;
         const QVariant value = rs.value(column);
         if (value.isNull() || (value.typeId() == QMetaType::QString && value.toString().isEmpty()))
             continue;
-        const QString name = joinPath(folder, BmpName(fldId, run.records));
-        if (WriteBarcodeBitmap(encodedText(value, barDef), name, barDef, instance))
+        batch.bitmaps.push_back({BmpName(fldId, batch.records), encodedText(value, barDef)});
+    }
+    return batch;
+}
+
+BarcodeRun writeBarcodes(const std::vector<BarcodeBatch>& batches, int threads) {
+    // Every bitmap of every batch in one list; each worker takes a contiguous share of it, with
+    // its own library instance and its own copy of each batch's setting.
+    std::vector<std::pair<const BarcodeBatch*, const BarcodeBatch::Bitmap*>> all;
+    for (const BarcodeBatch& batch : batches)
+        for (const BarcodeBatch::Bitmap& bitmap : batch.bitmaps)
+            all.emplace_back(&batch, &bitmap);
+    std::vector<QString> errors(all.size());
+    auto work = [&](size_t from, size_t to) {
+        BarcodeImage instance;
+        std::map<const BarcodeBatch*, LabelBarDef> settings;
+        for (size_t i = from; i < to; ++i) {
+            const auto [batch, bitmap] = all[i];
+            auto setting = settings.try_emplace(batch, batch->barDef).first;
+            if (!WriteBarcodeBitmap(bitmap->text, joinPath(batch->folder, bitmap->name),
+                                    setting->second, instance))
+                errors[i] = bitmap->name + QStringLiteral(": ") + instance.lastError();
+        }
+    };
+    const size_t workers = std::clamp<size_t>(size_t(std::max(threads, 1)), 1, all.size() + 1);
+    std::vector<std::thread> pool;
+    for (size_t w = 1; w < workers; ++w)
+        pool.emplace_back(work, all.size() * w / workers, all.size() * (w + 1) / workers);
+    work(0, all.size() / workers);
+    for (std::thread& t : pool)
+        t.join();
+
+    BarcodeRun run;
+    for (const BarcodeBatch& batch : batches)
+        run.records += batch.records;
+    for (const QString& error : errors) {
+        if (error.isEmpty())
             ++run.bitmaps;
         else
-            run.refused.append(
-                QStringLiteral("%1: %2").arg(BmpName(fldId, run.records), instance.lastError()));
+            run.refused.append(error);
     }
     return run;
+}
+
+BarcodeRun MakeBarcodeImages(const QString& folder, const QString& fieldName, int fldId,
+                             const QString& dbName, const QString& sql, LabelBarDef barDef) {
+    std::vector<BarcodeBatch> batch;
+    batch.push_back(collectBarcodes(folder, fieldName, fldId, dbName, sql, barDef));
+    return writeBarcodes(batch);
 }
 
 }  // namespace etq

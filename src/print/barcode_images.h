@@ -2,6 +2,7 @@
 
 #include <QString>
 #include <QStringList>
+#include <vector>
 
 #include "print/label_definition.h"
 
@@ -21,18 +22,41 @@ struct BarTypeMapping {
 };
 BarTypeMapping mapBarType(qint16 barType);
 
-// What one barcode cell's run made.
+// What barcode runs made.
 struct BarcodeRun {
     qint32 records = 0;   // records of the query, each with its record number
     qint32 bitmaps = 0;   // bitmaps written
     QStringList refused;  // one line per record whose value the symbology cannot encode
 };
 
+// The bitmaps one barcode cell needs: the mapped barcode setting and, for every record whose
+// column holds a value, the bitmap's name and the text it encodes.
+struct BarcodeBatch {
+    struct Bitmap {
+        QString name;  // BmpName
+        QString text;
+    };
+    QString folder;
+    LabelBarDef barDef;  // the bar type mapped to the library's code
+    qint32 records = 0;
+    std::vector<Bitmap> bitmaps;
+};
+
+// Reads the cell's column of every record of `sql` on the database `dbName` and makes the
+// batch. Throws jet::JetError when the database, the query or the column fails.
+BarcodeBatch collectBarcodes(const QString& folder, const QString& fieldName, int fldId,
+                             const QString& dbName, const QString& sql, LabelBarDef barDef);
+
+// Writes the batches' bitmaps with `threads` library instances working side by side (each on
+// its own share of the bitmaps). A text the symbology cannot encode gets no bitmap and a line
+// in `refused`, in record order.
+BarcodeRun writeBarcodes(const std::vector<BarcodeBatch>& batches, int threads = 1);
+
 // Writes one bitmap per record of `sql` (opened on the database `dbName`) whose column
-// `fieldName` holds a value, into `folder` under BmpName(fldId, record number). `barDef` is the
-// cell's own copy of the barcode setting; its bar type is mapped here. The text encoded is the
-// value cut to LeftLen characters (when above 0), after LeftPrefix. A value the symbology
-// cannot encode gets no bitmap and a line in `refused`; database failures throw jet::JetError.
+// `fieldName` holds a value, into `folder` under BmpName(fldId, record number), with one library
+// instance. `barDef` is the cell's own copy of the barcode setting; its bar type is mapped here.
+// The text encoded is the value cut to LeftLen characters (when above 0), after LeftPrefix.
+// Database failures throw jet::JetError.
 BarcodeRun MakeBarcodeImages(const QString& folder, const QString& fieldName, int fldId,
                              const QString& dbName, const QString& sql, LabelBarDef barDef);
 

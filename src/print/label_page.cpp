@@ -3,6 +3,7 @@
 #include <QFile>
 #include <cmath>
 #include <stdexcept>
+#include <thread>
 
 #include "jet/database.h"
 #include "jet/recordset.h"
@@ -307,8 +308,8 @@ void CreateLabFile(Surface& surface, const QString& fileName, const QString& dbN
 
 QString PrintBuiltInLabels(Surface& surface, const QString& dbName, quint8 queryType,
                            LabelDefinition& def) {
-    QStringList refused;
     QString pagePath;
+    BarcodeRun barcodes;
     try {
         const quint8 orderBy = labelOrder(surface);
         // Built before the page ticks the cells' fields, as the page's own query is later.
@@ -316,26 +317,38 @@ QString PrintBuiltInLabels(Surface& surface, const QString& dbName, quint8 query
         const QString folder = printFolder();
         deleteFilesIn(folder);
 
-        const LabelBarDef bar = def.bar;
-        if (bar.BarType >= 0) {
+        // Every barcode cell's values are read first, so that a failing query ends the run
+        // before the page is begun.
+        std::vector<BarcodeBatch> batches;
+        if (def.bar.BarType >= 0) {
             for (int i = 0; i < kLabelCellCount; ++i) {
                 const LabelCell& cell = def.cells[size_t(i)];
                 if (cell.ViewType != kBarcodeCell || !cell.UseCell || cell.FldID < 0) continue;
-                const LabelFieldSlot& slot = slotOfCell(cell, i);
-                refused +=
-                    MakeBarcodeImages(folder, slot.column.toString(), cell.FldID, dbName, sql, bar)
-                        .refused;
+                batches.push_back(collectBarcodes(folder, slotOfCell(cell, i).column.toString(),
+                                                  cell.FldID, dbName, sql, def.bar));
             }
         }
+        // The bitmaps are written beside the page while it is written; both are done before
+        // the browser is asked to show it.
+        std::thread bitmaps([&] {
+            barcodes =
+                writeBarcodes(batches, int(std::max(1u, std::thread::hardware_concurrency())));
+        });
         pagePath = joinPath(folder, kLabelPageFile);
-        CreateLabFile(surface, pagePath, dbName, queryType, orderBy, def);
+        try {
+            CreateLabFile(surface, pagePath, dbName, queryType, orderBy, def);
+        } catch (...) {
+            bitmaps.join();
+            throw;
+        }
+        bitmaps.join();
     } catch (const std::exception& e) {
         showCritical(describe(e), kFailureTitle);
         return {};
     }
     QString error;
     if (!pageViewer().showPage(pagePath, &error)) showCritical(error, kFailureTitle);
-    if (!refused.isEmpty()) reportRefusedBarcodes(refused);
+    if (!barcodes.refused.isEmpty()) reportRefusedBarcodes(barcodes.refused);
     return pagePath;
 }
 

@@ -5,6 +5,7 @@
 #include <QFileInfo>
 
 #include "platform/codepage1255.h"
+#include "platform/print_folder.h"
 #include "print/label_query.h"
 #include "print_fixture.h"
 
@@ -197,6 +198,19 @@ TEST_F(LabelPageTest, GridSizesGiveTheirShares) {
     EXPECT_TRUE(writePage().contains("    <td width='08.3%' height='100.0%' align='center'>"));
     def.page.PageRows = 0;
     EXPECT_THROW(writePage(), std::runtime_error);
+}
+
+TEST(PrintFolderTest, EmptyingDeletesFilesAndKeepsFolders) {
+    QTemporaryDir dir;
+    for (const char* name : {"B0400001.BMP", "etiqon1.htm", ".hidden"}) {
+        QFile file(dir.path() + "/" + name);
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+    }
+    ASSERT_TRUE(QDir(dir.path()).mkdir("kept"));
+    deleteFilesIn(dir.path());
+    EXPECT_EQ(QDir(dir.path()).entryList(QDir::AllEntries | QDir::Hidden | QDir::NoDotAndDotDot),
+              QStringList{"kept"});
+    EXPECT_THROW(deleteFilesIn(dir.path() + "/none"), std::runtime_error);
 }
 
 class PrintRunTest : public LabelPageTest {
