@@ -185,5 +185,30 @@ TEST_F(LabelQueryRun, EverySlotRunsForBothQueryTypes) {
         EXPECT_GE(lines.fieldIndex(slot.column.toString()), 0) << slot.slot;
 }
 
+TEST_F(LabelQueryRun, DocumentLinesOfIncludedDocumentsWithTheirAccount) {
+    work.execute(
+        "INSERT INTO tTempDocHeaders (WizFileID, [Number], RecIndex, DocType, Reference1, "
+        "AccountKey, Include, CardName, City) VALUES "
+        "(1, 500, 0, 1, 7001, 'C''1', True, 'לקוח', 'חיפה'), "
+        "(1, 501, 1, 1, 7002, 'C2', False, 'אחר', 'עכו')");
+    work.execute(
+        "INSERT INTO tTempDocLines (WizFileID, HeadNumber, LineNum, [Number], ItemKey, Copies, "
+        "Include, SerialNum) VALUES (1, 500, 1, 0, '100', 3, True, 'SN1'), "
+        "(1, 500, 2, 0, '999', 1, True, Null), (1, 500, 3, 0, 'O''K', 1, False, Null), "
+        "(1, 501, 1, 1, '100', 1, True, Null)");
+    LabelQueryInput in = allSlots(DocumentLineLabels);
+    jet::Recordset rs = work.openRecordset(BuildLabelQuery(in));
+    // Line 2's item is unknown, line 3 and document 501 are left out.
+    ASSERT_EQ(rs.recordCount(), 1);
+    EXPECT_EQ(rs.value("ItemKey").toString(), "100");
+    EXPECT_EQ(rs.value("Copies").toInt(), 3);
+    EXPECT_EQ(rs.value("CardCode").toString(), "C'1");
+    EXPECT_EQ(rs.value("AccountLabel").toString(), "c1.lbl");
+    EXPECT_EQ(rs.value("AlterKey").toString(), "A-100");
+    EXPECT_EQ(rs.value("SerialNum").toString(), "SN1");
+    EXPECT_EQ(rs.value("City").toString(), "חיפה");
+    EXPECT_EQ(rs.value("SymbolHeb").toString(), "ת.מ");
+}
+
 }  // namespace
 }  // namespace etq::print::test
