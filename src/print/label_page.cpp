@@ -2,6 +2,7 @@
 
 #include <QFile>
 #include <cmath>
+#include <exception>
 #include <stdexcept>
 #include <thread>
 
@@ -330,9 +331,14 @@ QString PrintBuiltInLabels(Surface& surface, const QString& dbName, quint8 query
         }
         // The bitmaps are written beside the page while it is written; both are done before
         // the browser is asked to show it.
+        std::exception_ptr bitmapFailure;
         std::thread bitmaps([&] {
-            barcodes =
-                writeBarcodes(batches, int(std::max(1u, std::thread::hardware_concurrency())));
+            try {
+                barcodes =
+                    writeBarcodes(batches, int(std::max(1u, std::thread::hardware_concurrency())));
+            } catch (...) {
+                bitmapFailure = std::current_exception();
+            }
         });
         pagePath = joinPath(folder, kLabelPageFile);
         try {
@@ -342,6 +348,7 @@ QString PrintBuiltInLabels(Surface& surface, const QString& dbName, quint8 query
             throw;
         }
         bitmaps.join();
+        if (bitmapFailure) std::rethrow_exception(bitmapFailure);
     } catch (const std::exception& e) {
         showCritical(describe(e), kFailureTitle);
         return {};
