@@ -22,7 +22,11 @@ QString joinPath(const QString& folder, const QString& fileName) {
 }
 
 QString privateTempFolder(QString* error) {
-    QString base = QStandardPaths::writableLocation(QStandardPaths::RuntimeLocation);
+    // The session's runtime folder when there is one; without it Qt would make one under the
+    // shared /tmp (and warn), so the user's cache folder serves instead.
+    QString base;
+    if (!qEnvironmentVariableIsEmpty("XDG_RUNTIME_DIR"))
+        base = QStandardPaths::writableLocation(QStandardPaths::RuntimeLocation);
     if (base.isEmpty())
         base = QStandardPaths::writableLocation(QStandardPaths::GenericCacheLocation);
     const QString folder = joinPath(base, QStringLiteral("etiquon"));

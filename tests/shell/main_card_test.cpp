@@ -89,8 +89,9 @@ TEST_F(MainCardTest, EveryControlIsOnItsTabInBothSurfaces) {
             }
             QWidget* w = card.findChild<QWidget*>(full);
             ASSERT_NE(w, nullptr) << full.toStdString();
-            if (tab >= 0)
+            if (tab >= 0) {
                 EXPECT_TRUE(card.mainTab()->widget(tab)->isAncestorOf(w)) << full.toStdString();
+            }
         }
     }
     EXPECT_EQ(card.mainTab()->count(), 8);
