@@ -17,6 +17,7 @@
 #include <QTextStream>
 #include <cstdio>
 
+#include "bench_sqlite.h"
 #include "db/file_names.h"
 #include "db/local_databases.h"
 #include "import/item_reader.h"
@@ -25,6 +26,8 @@
 
 namespace {
 
+using etq::bench::bindText;
+using etq::bench::check;
 using etq::demo::ItemRecord;
 namespace db = etq::db;
 
@@ -44,18 +47,6 @@ ItemRecord benchItem(int i) {
         item.prices[n] = {100 + (i * 7 + n * 13) % 9000, n % 3 == 2 ? QStringLiteral("$") : ""};
     item.queryGroups = QString::number(i % 256);
     return item;
-}
-
-void check(int rc, sqlite3* db) {
-    if (rc != SQLITE_OK && rc != SQLITE_DONE && rc != SQLITE_ROW) {
-        std::fprintf(stderr, "sqlite: %s\n", sqlite3_errmsg(db));
-        std::exit(1);
-    }
-}
-
-void bindText(sqlite3_stmt* s, int index, const QString& text) {
-    const QByteArray b = text.toUtf8();
-    sqlite3_bind_text(s, index, b.constData(), int(b.size()), SQLITE_TRANSIENT);
 }
 
 // A new item database, as a first import makes it.

@@ -13,11 +13,14 @@
 #include <QTextStream>
 #include <cstdio>
 
+#include "bench_sqlite.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "jet/sql_translator.h"
 
 using namespace etq::jet;
+using etq::bench::bindValue;
+using etq::bench::check;
 
 namespace {
 
@@ -68,24 +71,6 @@ QList<Item> makeItems(int count, int pass) {
         items.append(it);
     }
     return items;
-}
-
-void check(int rc, sqlite3* db) {
-    if (rc != SQLITE_OK && rc != SQLITE_DONE && rc != SQLITE_ROW) {
-        std::fprintf(stderr, "sqlite: %s\n", sqlite3_errmsg(db));
-        std::exit(1);
-    }
-}
-
-void bindValue(sqlite3_stmt* s, int index, const QVariant& v) {
-    if (v.typeId() == QMetaType::QString) {
-        const QByteArray b = v.toString().toUtf8();
-        sqlite3_bind_text(s, index, b.constData(), int(b.size()), SQLITE_TRANSIENT);
-    } else if (v.typeId() == QMetaType::Double) {
-        sqlite3_bind_double(s, index, v.toDouble());
-    } else {
-        sqlite3_bind_int64(s, index, v.toLongLong());
-    }
 }
 
 // Plain prepared statements: one INSERT per row in one transaction.

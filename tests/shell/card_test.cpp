@@ -222,7 +222,7 @@ TEST_F(CardTest, OpeningTheLabelSoftwareNeedsTheProgram) {
     c("txtLabelNameHead").setText(head);
 
     {
-        test::RecordingSink sink;
+        test::RecordingMessages sink;
         card.click("ImgEdit", 1);
         ASSERT_EQ(sink.shown.size(), 1u);
         EXPECT_EQ(sink.shown[0].text, GetCaption(39));
@@ -232,7 +232,7 @@ TEST_F(CardTest, OpeningTheLabelSoftwareNeedsTheProgram) {
     }
     touch(program);
     {
-        test::RecordingSink sink(MsgAnswer::No);
+        test::RecordingMessages sink(MsgAnswer::No);
         card.click("ImgEdit", 1);
         ASSERT_EQ(sink.shown.size(), 1u);
         EXPECT_EQ(sink.shown[0].text, GetCaption(40));
@@ -240,7 +240,7 @@ TEST_F(CardTest, OpeningTheLabelSoftwareNeedsTheProgram) {
         EXPECT_TRUE(started.isEmpty());
     }
     {
-        test::RecordingSink sink(MsgAnswer::Yes);
+        test::RecordingMessages sink(MsgAnswer::Yes);
         card.click("ImgEdit", 1);
         ASSERT_EQ(started.size(), 1);
         EXPECT_EQ(started[0], QStringList{program});
@@ -248,7 +248,7 @@ TEST_F(CardTest, OpeningTheLabelSoftwareNeedsTheProgram) {
     touch(label);
     touch(head);
     {
-        test::RecordingSink sink;
+        test::RecordingMessages sink;
         card.click("ImgEdit", 1);
         card.click("ImgEdit", 0);
         EXPECT_TRUE(sink.shown.empty());

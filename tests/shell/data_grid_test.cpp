@@ -41,7 +41,7 @@ class DataGridTest : public ::testing::Test {
     }
     QTemporaryDir dir;
     QString docDb;
-    test::RecordingSink sink;
+    test::RecordingMessages sink;
 };
 
 TEST_F(DataGridTest, TicksInABoundGridReachTheTable) {

@@ -46,17 +46,4 @@ void writeEmptyDbf(const QString& path, const QByteArray& fieldName, int fieldLe
     file.write(header + field + '\x0d' + '\x1a');
 }
 
-RecordingSink::RecordingSink(MsgAnswer answer) : answer_(answer) {
-    setMessageSink(this);
-}
-
-RecordingSink::~RecordingSink() {
-    setMessageSink(nullptr);
-}
-
-MsgAnswer RecordingSink::show(const Message& message) {
-    shown.push_back(message);
-    return message.buttons == MsgButtons::YesNo ? answer_ : MsgAnswer::Ok;
-}
-
 }  // namespace etq::test

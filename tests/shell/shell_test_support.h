@@ -3,7 +3,7 @@
 #include <QString>
 #include <vector>
 
-#include "platform/messages.h"
+#include "support/recording_messages.h"
 
 namespace etq::test {
 
@@ -16,18 +16,5 @@ QString settingsFile(const QString& application);
 
 // Writes a dBASE III file with one character field and no records.
 void writeEmptyDbf(const QString& path, const QByteArray& fieldName, int fieldLength);
-
-// Keeps every message shown and answers questions with a chosen answer.
-class RecordingSink : public MessageSink {
-  public:
-    explicit RecordingSink(MsgAnswer answer = MsgAnswer::Yes);
-    ~RecordingSink() override;
-    MsgAnswer show(const Message& message) override;
-
-    std::vector<Message> shown;
-
-  private:
-    MsgAnswer answer_;
-};
 
 }  // namespace etq::test
