@@ -22,7 +22,7 @@
 #include "db/local_databases.h"
 #include "import/item_reader.h"
 #include "samples/host_records.h"
-#include "shell/memory_surface.h"
+#include "surface/memory_surface.h"
 
 namespace {
 

@@ -23,7 +23,7 @@
 #include "print/label_definition.h"
 #include "print/label_page.h"
 #include "print/label_query.h"
-#include "shell/memory_surface.h"
+#include "surface/memory_surface.h"
 
 using namespace etq;
 

@@ -2,6 +2,11 @@
 
 #include <QString>
 #include <QStringList>
+#include <functional>
+
+namespace etq {
+class Context;
+}
 
 namespace etq::cli {
 
@@ -29,5 +34,13 @@ bool takeFlag(QStringList& args, const QString& name);
 
 // Prints a message on stderr, prefixed with the program name.
 void printError(const QString& message);
+
+// Starts a command's context as the window starts its own: the application name of the
+// SettingID, and the language and connection parameters from that settings store.
+void startContext(Context& context, const QString& settingId);
+
+// Runs a command's work: 0 when it ran to its end; a failure is one line on stderr, also one the
+// window passes over without a word, and gives 1.
+int runReporting(const std::function<void()>& work);
 
 }  // namespace etq::cli

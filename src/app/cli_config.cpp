@@ -3,8 +3,7 @@
 
 #include "app/cli_command.h"
 #include "platform/settings_store.h"
-#include "shell/settings_groups.h"
-#include "shell/surface_controls.h"
+#include "platform/settings_keys.h"
 
 namespace etq::cli {
 
@@ -18,10 +17,8 @@ QList<std::pair<QString, QString>> tableKeys() {
             keys.append({entry.section.toString(), entry.key.toString()});
             continue;
         }
-        for (int i = 0; i < controlArraySize(entry.control); ++i)
-            keys.append(
-                {entry.section.toString(),
-                 entry.key.toString() + QStringLiteral("%1").arg(i, 2, 10, QLatin1Char('0'))});
+        for (int i = 0; i < entry.elements; ++i)
+            keys.append({entry.section.toString(), elementKey(entry, i)});
     }
     return keys;
 }

@@ -59,6 +59,12 @@ int runInitDb(const QStringList& arguments) {
         out << "kept the document database " << docDb << Qt::endl;
     } else {
         const QString delivered = db::deliveredDocumentDatabase();
+        if (delivered.isEmpty()) {
+            printError(QString("the delivered document database %1 is not installed beside the "
+                               "program nor in its share/etiquon folder")
+                           .arg(db::kDocDatabaseFile));
+            return 1;
+        }
         if (!QFile::copy(delivered, docDb)) {
             printError(QString("cannot install the delivered document database %1 as %2")
                            .arg(delivered, docDb));
@@ -73,7 +79,10 @@ int runInitDb(const QStringList& arguments) {
         if (!checkExisting(itemDb)) return 1;
         out << "kept the item database " << itemDb << Qt::endl;
     } else {
-        if (db::CreateItemDatabase(itemDb).isEmpty() || db::AddAccountTables(itemDb).isEmpty())
+        if (runReporting([&] {
+                db::CreateItemDatabase(itemDb);
+                db::AddAccountTables(itemDb);
+            }))
             return 1;
         out << "created the item database " << itemDb << Qt::endl;
     }
@@ -82,7 +91,7 @@ int runInitDb(const QStringList& arguments) {
         if (!checkExisting(workDb)) return 1;
         out << "kept the working database " << workDb << Qt::endl;
     } else {
-        if (db::CreateDocDatabase(docDb, itemDb, workDb, {}).isEmpty()) return 1;
+        if (runReporting([&] { db::CreateDocDatabase(docDb, itemDb, workDb, {}); })) return 1;
         out << "created the working database " << workDb << Qt::endl;
     }
     return 0;
@@ -95,9 +104,9 @@ int runUpgrade(const QStringList& arguments) {
         printError("usage: etiquon-cli upgrade --db DIR");
         return 2;
     }
-    const bool ok = db::UpgradeItemDatabase(folder);
-    QTextStream(stdout) << (ok ? "Upgrade successfull" : "Upgrade failed") << Qt::endl;
-    return ok ? 0 : 1;
+    const int status = runReporting([&] { db::UpgradeItemDatabase(folder); });
+    QTextStream(stdout) << (status == 0 ? "Upgrade successfull" : "Upgrade failed") << Qt::endl;
+    return status;
 }
 
 }  // namespace etq::cli

@@ -9,14 +9,12 @@
 #include <optional>
 
 #include "app/cli_command.h"
+#include "card/import_adapters.h"
 #include "db/file_names.h"
-#include "import/connection.h"
 #include "import/item_import.h"
-#include "import/progress_bar.h"
-#include "shell/card_controller.h"
-#include "shell/component.h"
-#include "shell/memory_surface.h"
-#include "shell/settings_groups.h"
+#include "platform/context.h"
+#include "platform/progress.h"
+#include "surface/control_values.h"
 
 namespace etq::cli {
 
@@ -57,72 +55,88 @@ struct RunOptions {
 
 // Points the connection parameters at the company folder: its parent is the server folder,
 // its own name the company.
-void useCompanyFolder(const QString& company) {
+void useCompanyFolder(Context& context, const QString& company) {
     const QFileInfo info(QDir(company).absolutePath());
-    connParams().server = info.path();
-    connParams().database = info.fileName();
+    context.connection.server = info.path();
+    context.connection.database = info.fileName();
 }
 
-// Chooses the price list `number` in cmbPriceField. A number the company's price lists lack
-// gets an entry of its own, so that the run tells what it makes of it.
-void choosePriceField(const Surface& surface, qint16 number) {
-    const ControlRef combo = surface.control(QStringLiteral("cmbPriceField"));
-    for (int i = 0; i < combo.listCount(); ++i) {
-        if (combo.itemData(i) == number) {
-            combo.setListIndex(i);
-            return;
-        }
+// The price list `number` chosen among the company's. A number the company lacks gets an entry
+// of its own, so that the run tells what it makes of it.
+void choosePriceField(StoredValues& stored, qint16 number) {
+    const QString combo = QStringLiteral("cmbPriceField");
+    EntryList lists = stored.list(combo);
+    qsizetype position = 0;
+    while (position < lists.size() && lists[position].data != number)
+        ++position;
+    if (position == lists.size()) {
+        lists.append({QString::number(number), number});
+        stored.setList(combo, lists);
     }
-    combo.addItem(QString::number(number), number);
-    combo.setListIndex(combo.listCount() - 1);
+    stored.choose(combo, QString::number(position));
 }
 
-void applyOptions(const Surface& surface, const RunOptions& options, qint16 priceField) {
-    auto check = [&](const char* box) { surface.control(QString::fromLatin1(box)).setValue(1); };
+// The command line's options on top of the stored settings, as if they had been saved there.
+void chooseOptions(StoredValues& stored, const RunOptions& options, qint16 priceField) {
+    auto check = [&](const char* box) { stored.choose(QString::fromLatin1(box), "1"); };
     if (options.clean) check("ChkClean");
     if (options.priceLists) check("chkReadPriceList");
     if (options.specialPrices) check("ChkImportAlterPrices");
-    if (options.foreignNames) surface.control(QStringLiteral("CmbItemNameType")).setListIndex(1);
-    if (options.priceField) choosePriceField(surface, priceField);
-    if (options.fromKey)
-        surface.control(QStringLiteral("txtFromItemKey")).setText(*options.fromKey);
-    if (options.toKey) surface.control(QStringLiteral("txtToItemKey")).setText(*options.toKey);
-    if (options.copies) surface.control(QStringLiteral("txtCopies")).setText(*options.copies);
-    surface.control(QStringLiteral("txtDBPath")).setText(QDir(options.folder).absolutePath());
+    if (options.foreignNames) stored.choose(QStringLiteral("CmbItemNameType"), "1");
+    if (options.priceField) choosePriceField(stored, priceField);
+    if (options.fromKey) stored.choose(QStringLiteral("txtFromItemKey"), *options.fromKey);
+    if (options.toKey) stored.choose(QStringLiteral("txtToItemKey"), *options.toKey);
+    if (options.copies) stored.choose(QStringLiteral("txtCopies"), *options.copies);
+    stored.choose(QStringLiteral("txtDBPath"), QDir(options.folder).absolutePath());
 }
 
-// Draws the surface's progress bar and step message on a terminal, over and over one line.
-class TerminalProgress {
+// Draws the run's step and progress on a terminal, over and over one line.
+class TerminalProgress : public Progress {
   public:
-    explicit TerminalProgress(const Surface& surface) : surface_(surface) {
-        if (!isatty(fileno(stderr))) return;
-        active_ = true;
-        ProgressBar::setObserver([this](int fill, int frame) { draw(fill, frame); });
-    }
-    ~TerminalProgress() {
+    TerminalProgress() : active_(isatty(fileno(stderr))) {}
+    ~TerminalProgress() override {
         if (!active_) return;
-        ProgressBar::setObserver({});
         std::fputs("\r\033[K", stderr);
         std::fflush(stderr);
     }
 
+    void step(const QString& text) override {
+        step_ = text;
+        draw();
+    }
+    void show(qint64 done, qint64 total) override {
+        if (total < 1 || done < 0 || done > total) return;
+        percent_ = int(done * 100 / total);
+        draw();
+    }
+    void clear() override {
+        percent_ = 0;
+        draw();
+    }
+    void fill() override {
+        percent_ = 100;
+        draw();
+    }
+    const QString& lastStep() const { return step_; }
+
   private:
-    void draw(int fill, int frame) {
+    void draw() {
+        if (!active_) return;
         constexpr int kCells = 30;
-        const int done = frame > 0 ? fill * kCells / frame : 0;
-        const QString step = surface_.control(QStringLiteral("Message1")).caption();
+        const int done = percent_ * kCells / 100;
         const QString line = QStringLiteral("\r\033[K[%1%2] %3% %4")
                                  .arg(QString(done, u'#'), QString(kCells - done, u'.'))
-                                 .arg(frame > 0 ? fill * 100 / frame : 0, 3)
-                                 .arg(step);
+                                 .arg(percent_, 3)
+                                 .arg(step_);
         if (line == shown_) return;  // the bar moves every few records: draw only changes
         shown_ = line;
         std::fputs(line.toLocal8Bit().constData(), stderr);
         std::fflush(stderr);
     }
 
-    const Surface& surface_;
-    bool active_ = false;
+    bool active_;
+    int percent_ = 0;
+    QString step_;
     QString shown_;
 };
 
@@ -163,31 +177,24 @@ int runImportItems(const QStringList& arguments) {
         return 1;
     }
 
-    // The control as the window starts it, then pointed at this company: its lists are filled
-    // from there and the stored choices of the reading-items tab are applied to them again.
-    MemorySurface surface;
-    CardController controller(surface);
-    connectParts(controller, surface);
-    controller.hooks().installedPrinters = [] { return QStringList(); };
-    controller.InitProperties(common.settingId);
-    useCompanyFolder(options.company);
-    controller.FillCmbPrice();
-    controller.FillCmbItmQGrp();
-    controller.FillCmbItmBelong();
-    GetSetParams(surface, 2, LoadSettings);
-    applyOptions(surface, options, priceField);
+    // The settings the window would load, pointed at this company: its lists are read from
+    // there and the stored choices of the reading-items tab select among them.
+    Context context;
+    startContext(context, common.settingId);
+    useCompanyFolder(context, options.company);
+    StoredValues stored(context.applicationName);
+    FillHostLists(stored, context);
 
-    bool finished = false;
-    {
-        TerminalProgress progress(surface);
-        finished = ImportItems(surface);
+    chooseOptions(stored, options, priceField);
+
+    TerminalProgress progress;
+    const int status = runReporting(
+        [&] { importItems(readItemImportOptions(stored, context), context, progress); });
+    if (status != 0) {
+        printError(QString("the item import stopped at \"%1\"").arg(progress.lastStep()));
+        return status;
     }
-    const QString step = surface.control(QStringLiteral("Message1")).caption();
-    if (!finished) {
-        printError(QString("the item import stopped at \"%1\"").arg(step));
-        return 1;
-    }
-    QTextStream(stdout) << step << Qt::endl;
+    QTextStream(stdout) << progress.lastStep() << Qt::endl;
     return 0;
 }
 

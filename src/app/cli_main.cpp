@@ -5,6 +5,11 @@
 #include <span>
 
 #include "app/cli_command.h"
+#include "card/card_controller.h"
+#include "import/connection.h"
+#include "platform/context.h"
+#include "platform/failure.h"
+#include "platform/settings_store.h"
 
 namespace etq::cli {
 
@@ -44,6 +49,22 @@ bool takeFlag(QStringList& args, const QString& name) { return args.removeAll(na
 
 void printError(const QString& message) {
     QTextStream(stderr) << "etiquon-cli: " << message << Qt::endl;
+}
+
+void startContext(Context& context, const QString& settingId) {
+    context.applicationName = applicationNameFor(settingId);
+    loadLanguage(context);
+    GetConnParams(context);
+}
+
+int runReporting(const std::function<void()>& work) {
+    try {
+        work();
+        return 0;
+    } catch (const std::exception& e) {
+        printError(describe(e));
+        return 1;
+    }
 }
 
 int runConfig(const QStringList& args);  // cli_config.cpp

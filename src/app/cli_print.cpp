@@ -3,38 +3,26 @@
 #include <QTextStream>
 
 #include "app/cli_command.h"
+#include "card/card_controller.h"
+#include "card/print_adapters.h"
+#include "dialogs/bound_grid_model.h"
 #include "dialogs/item_selection.h"
-#include "jet/database.h"
 #include "jet/error.h"
-#include "jet/recordset.h"
 #include "platform/browser.h"
+#include "platform/context.h"
 #include "platform/messages.h"
+#include "platform/printers.h"
+#include "platform/progress.h"
 #include "print/label_query.h"
-#include "shell/bound_grid_model.h"
-#include "shell/card_controller.h"
-#include "shell/component.h"
-#include "shell/memory_surface.h"
+#include "surface/control_values.h"
 
 namespace etq::cli {
 
 namespace {
 
-// The control on the headless surface, started as the window starts: settings groups and the
-// built-in label definition from the store of the SettingID's application name.
-struct HeadlessCard {
-    explicit HeadlessCard(const QString& settingId) : controller(surface) {
-        connectParts(controller, surface);
-        controller.InitProperties(settingId);
-    }
-    MemorySurface surface;
-    CardController controller;
-};
-
 // Writes messages on stderr like the plain sink, and remembers whether one was a failure.
 class CountingSink : public MessageSink {
   public:
-    CountingSink() { setMessageSink(this); }
-    ~CountingSink() override { setMessageSink(nullptr); }
     MsgAnswer show(const Message& message) override {
         if (message.icon == MsgIcon::Critical) ++failures;
         return stderrSink_.show(message);
@@ -44,6 +32,14 @@ class CountingSink : public MessageSink {
   private:
     StderrMessageSink stderrSink_;
 };
+
+// The installed printers, as the window lists them in cmbPrinter.
+EntryList printerEntries() {
+    EntryList entries;
+    for (const QString& printer : installedPrinters())
+        entries.append({printer, 0});
+    return entries;
+}
 
 int markUsage() {
     printError(
@@ -71,9 +67,11 @@ int runMarkItems(const QStringList& arguments) {
         return 2;
     }
 
-    HeadlessCard card(common.settingId);
-    const QString filter = ItemKeyRangeCondition(card.surface.control("txtFromItem").text(),
-                                                 card.surface.control("txtToItem").text());
+    Context context;
+    startContext(context, common.settingId);
+    const StoredValues stored(context.applicationName);
+    const QString filter = ItemKeyRangeCondition(stored.text(QStringLiteral("txtFromItem")),
+                                                 stored.text(QStringLiteral("txtToItem")));
     BoundGridModel grid;
     ItemSelection selection(grid, filter);
     QTextStream out(stdout);
@@ -119,11 +117,31 @@ int runPrintItems(const QStringList& arguments) {
     }
     CountingSink sink;
     HeadlessPageViewer viewer(open);
-    setPageViewer(&viewer);
-    HeadlessCard card(common.settingId);
-    card.surface.control("txtDBPath").setText(folder);
-    card.controller.click("cmdPrintItmes");
-    setPageViewer(nullptr);
+    Context context;
+    context.setMessages(&sink);
+    context.setPages(&viewer);
+    startContext(context, common.settingId);
+    StoredValues stored(context.applicationName);
+    stored.setList(QStringLiteral("cmbPrinter"), printerEntries());
+    stored.choose(QStringLiteral("txtDBPath"), folder);
+    loadStartUpLabelDefinition(stored, context);
+
+    NoProgress progress;
+    BuiltInPrint print;
+    const int status = runReporting([&] {
+        ItemPrintOptions options = readItemPrintOptions(stored);
+        print = printItemLabels(options, context, progress);
+    });
+    if (status != 0) return status;
+    QString error;
+    if (!context.pages().showPage(print.pagePath, &error)) {
+        printError(error);
+        return 1;
+    }
+    if (!print.refusedBarcodes.isEmpty())
+        printError(QStringLiteral("%1 labels have no barcode:\n%2")
+                       .arg(print.refusedBarcodes.size())
+                       .arg(print.refusedBarcodes.join(u'\n')));
     return sink.failures ? 1 : 0;
 }
 

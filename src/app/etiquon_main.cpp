@@ -6,9 +6,10 @@
 #include <QTextStream>
 #include <QVBoxLayout>
 
+#include "card/main_card.h"
+#include "platform/context.h"
+#include "platform/qt_browser.h"
 #include "platform/qt_messages.h"
-#include "shell/captions.h"
-#include "shell/main_card.h"
 
 namespace {
 
@@ -63,18 +64,19 @@ int main(int argc, char** argv) {
 
     QWidget window;
     window.setWindowTitle(QStringLiteral("Etiquon"));
-    auto* layout = new QVBoxLayout(&window);
-    auto* card = new etq::MainCard(&window);
-    layout->addWidget(card);
+    etq::Context context;
     etq::QtMessageSink sink(&window);
-    etq::setMessageSink(&sink);
+    context.setMessages(&sink);
+    etq::DesktopPageViewer viewer;
+    context.setPages(&viewer);
+    auto* layout = new QVBoxLayout(&window);
+    auto* card = new etq::MainCard(context, &window);
+    layout->addWidget(card);
 
     card->InitProperties(parser.value(settingId));
-    if (parser.isSet(english)) etq::setLanguage(1);
+    if (parser.isSet(english)) context.language = 1;
 
     if (parser.isSet(screenshots)) return saveScreenshots(window, *card, parser.value(screenshots));
     window.show();
-    const int status = app.exec();
-    etq::setMessageSink(nullptr);
-    return status;
+    return app.exec();
 }

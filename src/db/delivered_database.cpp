@@ -72,9 +72,18 @@ void buildDocumentDatabase(const QString& definitionFile, const QString& outPath
 }
 
 QString deliveredDocumentDatabase() {
-    const QString beside = inFolder(QCoreApplication::applicationDirPath(), kDocDatabaseFile);
-    if (QFileInfo::exists(beside)) return beside;
-    return QStringLiteral(ETIQUON_DELIVERED_KDB);
+    // ETIQUON_DATA_DIR names the folder outright (tests, a relocated data folder); otherwise the
+    // file lies beside the program in a build, or in share/etiquon of the installed tree.
+    const QString dataDir = qEnvironmentVariable("ETIQUON_DATA_DIR");
+    const QString programDir = QCoreApplication::applicationDirPath();
+    const QStringList candidates = {
+        dataDir.isEmpty() ? QString() : inFolder(dataDir, kDocDatabaseFile),
+        inFolder(programDir, kDocDatabaseFile),
+        inFolder(programDir, QStringLiteral("../share/etiquon/") + kDocDatabaseFile),
+    };
+    for (const QString& path : candidates)
+        if (!path.isEmpty() && QFileInfo::exists(path)) return QFileInfo(path).absoluteFilePath();
+    return {};
 }
 
 }  // namespace etq::db

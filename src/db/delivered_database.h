@@ -9,7 +9,8 @@ namespace etq::db {
 // JetError, or std::runtime_error for a definition it cannot read.
 void buildDocumentDatabase(const QString& definitionFile, const QString& outPath);
 
-// Where the delivered file is found: next to the running program, else the build's copy.
+// Where the delivered file is found: in $ETIQUON_DATA_DIR, beside the running program, or in
+// share/etiquon of the tree the program is installed in. Empty text when it is nowhere.
 QString deliveredDocumentDatabase();
 
 }  // namespace etq::db

@@ -5,13 +5,13 @@
 
 #include "db/file_names.h"
 #include "db/schemas.h"
-#include "platform/messages.h"
-#include "shell/captions.h"
+#include "platform/context.h"
+#include "platform/failure.h"
+#include "platform/progress.h"
 
 namespace etq::db {
 
 using jet::Database;
-using jet::JetError;
 
 namespace {
 
@@ -22,21 +22,6 @@ void removeExisting(const QString& path) {
     if (!file.remove())
         jet::fail(jet::err::kCannotOpen,
                   QString("Cannot replace '%1': %2.").arg(path, file.errorString()));
-}
-
-void reportEngineError(const JetError& e) {
-    showCritical(e.description(), GetCaption(1));
-}
-
-// Runs a creation step list and turns a failure into the reported empty result.
-QString created(const QString& path, const std::function<void()>& build) {
-    try {
-        build();
-        return path;
-    } catch (const JetError& e) {
-        reportEngineError(e);
-        return {};
-    }
 }
 
 void createQueries(Database& db, const schema::SavedQuery* queries, size_t count) {
@@ -52,56 +37,49 @@ void AttachTable(Database& db, const QString& sourcePath, const QString& tableNa
 
 QString CreateDocDatabase(const QString& docRefPath, const QString& itemDbPath,
                           const QString& workPath, const QString& logDbPath) {
-    return created(workPath, [&] {
-        removeExisting(workPath);
-        Database db = Database::create(workPath);
-        db.createTable(schema::tempDocHeaders());
-        db.createTable(schema::tempDocLines());
-        db.createTable(schema::transports());
-        for (const schema::Link& link : schema::workLinks()) {
-            const bool fromItems = *link.sourceFile == kItemDatabaseFile;
-            AttachTable(db, fromItems ? itemDbPath : docRefPath, link.table);
-        }
-        if (!logDbPath.isEmpty()) AttachTable(db, logDbPath, schema::stockLog().name);
-        createQueries(db, schema::kWorkQueries, std::size(schema::kWorkQueries));
-    });
+    removeExisting(workPath);
+    Database db = Database::create(workPath);
+    db.createTable(schema::tempDocHeaders());
+    db.createTable(schema::tempDocLines());
+    db.createTable(schema::transports());
+    for (const schema::Link& link : schema::workLinks()) {
+        const bool fromItems = *link.sourceFile == kItemDatabaseFile;
+        AttachTable(db, fromItems ? itemDbPath : docRefPath, link.table);
+    }
+    if (!logDbPath.isEmpty()) AttachTable(db, logDbPath, schema::stockLog().name);
+    createQueries(db, schema::kWorkQueries, std::size(schema::kWorkQueries));
+    return workPath;
 }
 
 QString CreateItemDatabase(const QString& path) {
-    return created(path, [&] {
-        removeExisting(path);
-        Database db = Database::create(path);
-        for (const jet::TableDef* t :
-             {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
-            db.createTable(*t);
-        createQueries(db, schema::kItemQueries, std::size(schema::kItemQueries));
-    });
+    removeExisting(path);
+    Database db = Database::create(path);
+    for (const jet::TableDef* t :
+         {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
+        db.createTable(*t);
+    createQueries(db, schema::kItemQueries, std::size(schema::kItemQueries));
+    return path;
 }
 
 QString AddAccountTables(const QString& path) {
     // A missing file is told in English whatever the language, as the upgrade always did.
-    if (!QFileInfo::exists(path)) {
-        showCritical("Database not found", "Error");
-        return {};
-    }
-    return created(path, [&] {
-        Database db = Database::open(path);
-        db.createTable(schema::accountDef());
-        db.createTable(schema::priceList());
-    });
+    if (!QFileInfo::exists(path)) throw Failure("Database not found", "Error");
+    Database db = Database::open(path);
+    db.createTable(schema::accountDef());
+    db.createTable(schema::priceList());
+    return path;
 }
 
 QString CreateTempItemDatabase(const QString& tempPath, const QString& itemDbPath) {
-    return created(tempPath, [&] {
-        removeExisting(tempPath);
-        Database db = Database::create(tempPath);
-        for (const jet::TableDef* t : {&schema::tempItems(), &schema::tempAlterKeys(),
-                                       &schema::tempAlterPrices(), &schema::tempPriceList()})
-            db.createTable(*t);
-        for (const char* table : schema::kTempItemLinks)
-            AttachTable(db, itemDbPath, table);
-        createQueries(db, schema::kTempItemQueries, std::size(schema::kTempItemQueries));
-    });
+    removeExisting(tempPath);
+    Database db = Database::create(tempPath);
+    for (const jet::TableDef* t : {&schema::tempItems(), &schema::tempAlterKeys(),
+                                   &schema::tempAlterPrices(), &schema::tempPriceList()})
+        db.createTable(*t);
+    for (const char* table : schema::kTempItemLinks)
+        AttachTable(db, itemDbPath, table);
+    createQueries(db, schema::kTempItemQueries, std::size(schema::kTempItemQueries));
+    return tempPath;
 }
 
 void MergeTempItems(const QString& tempPath) {
@@ -114,26 +92,24 @@ void MergeTempItems(const QString& tempPath) {
 }
 
 QString CreateLogDatabase(const QString& path) {
-    return created(path, [&] {
-        removeExisting(path);
-        Database db = Database::create(path);
-        db.createTable(schema::stockLog());
-    });
+    removeExisting(path);
+    Database db = Database::create(path);
+    db.createTable(schema::stockLog());
+    return path;
 }
 
 void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrices,
-                     const std::function<void(const QString&)>& showMessage) {
+                     const Context& context, Progress& progress) {
     Database db = Database::open(itemDbPath);
     if (!cleanItems) return;
-    if (showMessage) showMessage(GetCaption(42));
+    progress.step(context.caption(42));
     db.execute("DELETE * FROM tItems");
     if (alterPrices) db.execute("Delete * From tAlterPrices");
 }
 
-bool UpgradeItemDatabase(const QString& folder) {
+void UpgradeItemDatabase(const QString& folder) {
     const QString path = inFolder(folder, kItemDatabaseFile);
-    if (!QFileInfo::exists(path)) return true;
-    return !AddAccountTables(path).isEmpty();
+    if (QFileInfo::exists(path)) AddAccountTables(path);
 }
 
 }  // namespace etq::db

@@ -6,9 +6,13 @@
 #include "jet/database.h"
 
 // The creation routines of the component's databases. Each creating routine returns the path
-// it made, or an empty text after it has reported the failure (the engine's description,
-// caption 1 as title, the critical icon). A half-built file stays where it is; the next
-// creation deletes it first.
+// it made; a failure throws (the engine's JetError, or a Failure) and the caller reports it. A
+// half-built file stays where it is; the next creation deletes it first.
+namespace etq {
+class Context;
+class Progress;
+}  // namespace etq
+
 namespace etq::db {
 
 // The working database: the document tables, links to the permanent tables of the document
@@ -23,7 +27,8 @@ void AttachTable(jet::Database& db, const QString& sourcePath, const QString& ta
 // that is there: its items, alternate keys and special prices are lost.
 QString CreateItemDatabase(const QString& path);
 
-// Adds tAccountDef and tPriceList to an item database (the upgrade of an older file).
+// Adds tAccountDef and tPriceList to an item database (the upgrade of an older file). A missing
+// file is the Failure "Database not found", titled "Error" whatever the language.
 QString AddAccountTables(const QString& path);
 
 // The temporary items database: staging tables, links to the item database at itemDbPath, and
@@ -39,13 +44,12 @@ void MergeTempItems(const QString& tempPath);
 QString CreateLogDatabase(const QString& path);
 
 // Empties the item table before an import when `cleanItems` is set, and the special prices
-// too when `alterPrices` is set as well; shows caption 42 through showMessage first. Does not
-// report: a failure throws to the caller.
+// too when `alterPrices` is set as well; shows caption 42 as the step first.
 void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrices,
-                     const std::function<void(const QString&)>& showMessage);
+                     const Context& context, Progress& progress);
 
-// What the upgrade button does with the database folder: adds the account tables to an
-// existing item database. True when there is nothing to upgrade or the upgrade worked.
-bool UpgradeItemDatabase(const QString& folder);
+// What the upgrade does with the database folder: adds the account tables to an existing item
+// database. A folder without one has nothing to upgrade, which is no failure.
+void UpgradeItemDatabase(const QString& folder);
 
 }  // namespace etq::db

@@ -4,7 +4,7 @@
 #include "dialogs/items_query.h"
 #include "jet/error.h"
 #include "jet/vb.h"
-#include "shell/bound_grid_model.h"
+#include "dialogs/bound_grid_model.h"
 
 namespace etq {
 

@@ -8,12 +8,11 @@
 #include <QPushButton>
 #include <QTableView>
 
-#include "print/label_query.h"
-#include "shell/bound_grid_model.h"
-#include "shell/captions.h"
-#include "shell/card_controller.h"
-#include "shell/language_switch.h"
-#include "shell/surface.h"
+#include "dialogs/bound_grid_model.h"
+#include "platform/captions.h"
+#include "platform/failure.h"
+#include "platform/log.h"
+#include "dialogs/language_switch.h"
 
 namespace etq {
 
@@ -72,20 +71,24 @@ QComboBox* makeList(const QString& name, const QString& items, QWidget* parent) 
 }  // namespace
 
 SelectItemWindow::SelectItemWindow(const QString& databaseFolder, const QString& rangeFilter,
-                                   QWidget* parent)
-    : QDialog(parent), grid_(new BoundGridModel(this)), selection_(*grid_, rangeFilter) {
+                                   qint16 language, QWidget* parent)
+    : QDialog(parent),
+      language_(language),
+      grid_(new BoundGridModel(this)),
+      selection_(*grid_, rangeFilter) {
     setObjectName(QStringLiteral("frmSelectItem"));
     setWindowTitle(QStringLiteral("בחירת פריטים להדפסה"));
     setLayoutDirection(Qt::RightToLeft);
     buildControls();
-    if (isEnglish()) switchToEnglish();
+    if (language_ > 0) switchToEnglish();
     sortBy_->setCurrentIndex(0);
     sortOrder_->setCurrentIndex(0);
     try {
         selection_.open(databaseFolder, qint16(sortBy_->currentIndex()),
                         qint16(sortOrder_->currentIndex()));
-    } catch (const std::exception&) {
+    } catch (const std::exception& e) {
         // An item database that cannot be opened leaves the grid empty, as its data control does.
+        qCInfo(log::card) << "item selection:" << describe(e);
     }
     applyColumnLayout();
     resize(720, 560);
@@ -165,16 +168,17 @@ void SelectItemWindow::showItems(bool markedOnly) {
     try {
         selection_.show(markedOnly, qint16(sortBy_->currentIndex()),
                         qint16(sortOrder_->currentIndex()));
-    } catch (const std::exception&) {
+    } catch (const std::exception& e) {
         // The buttons pass over failures; the grid stays empty.
+        qCInfo(log::card) << "item selection:" << describe(e);
     }
     applyColumnLayout();
 }
 
 void SelectItemWindow::applyColumnLayout() {
     for (int column = 0; column < 4 && column < grid_->columnCount(); ++column)
-        grid_->setHeader(column, GetCaption(kHeaderCaptions[column]));
-    const Qt::Alignment text = BoundGridModel::alignmentOfCode(GetColumnAlignment());
+        grid_->setHeader(column, GetCaption(kHeaderCaptions[column], language_));
+    const Qt::Alignment text = BoundGridModel::alignmentOfCode(GetColumnAlignment(language_));
     const Qt::Alignment number = BoundGridModel::alignmentOfCode(kRightCentred);
     grid_->setAlignment(ItemSelection::kKeyColumn - 1, text);
     grid_->setAlignment(ItemSelection::kMarkColumn - 1, number);
@@ -188,16 +192,6 @@ void SelectItemWindow::goToRow(int row) {
     const QModelIndex index = grid_->index(row, ItemSelection::kKeyColumn - 1);
     view_->setCurrentIndex(index);
     view_->scrollTo(index);
-}
-
-void connectItemSelection(CardController& controller, const Surface& surface, QWidget* parent) {
-    controller.setWork(QStringLiteral("cmdSelectItems"), [&controller, &surface, parent](int) {
-        const QString filter =
-            ItemKeyRangeCondition(surface.control(QStringLiteral("txtFromItem")).text(),
-                                  surface.control(QStringLiteral("txtToItem")).text());
-        SelectItemWindow window(controller.databaseFolder(), filter, parent);
-        window.exec();
-    });
 }
 
 }  // namespace etq

@@ -11,8 +11,6 @@ class QTableView;
 namespace etq {
 
 class BoundGridModel;
-class CardController;
-class Surface;
 
 // The item selection window frmSelectItem: the items of the item database in the grid
 // VSSelectItems, bound to tItems, so that every tick and copies value is written at once.
@@ -22,7 +20,8 @@ class SelectItemWindow : public QDialog {
     Q_OBJECT
 
   public:
-    SelectItemWindow(const QString& databaseFolder, const QString& rangeFilter,
+    // `language` is the selector of the run: 1 English, else Hebrew.
+    SelectItemWindow(const QString& databaseFolder, const QString& rangeFilter, qint16 language,
                      QWidget* parent = nullptr);
     ~SelectItemWindow() override;
 
@@ -36,6 +35,7 @@ class SelectItemWindow : public QDialog {
     void applyColumnLayout();
     void goToRow(int row);
 
+    qint16 language_;
     BoundGridModel* grid_;
     ItemSelection selection_;
     QTableView* view_ = nullptr;
@@ -45,9 +45,5 @@ class SelectItemWindow : public QDialog {
     QLineEdit* findKey_ = nullptr;
     QLineEdit* findName_ = nullptr;
 };
-
-// Wires cmdSelectItems of the control to this window: the label tab's item range narrows the
-// list, the database folder is the one the control took for its dialogs.
-void connectItemSelection(CardController& controller, const Surface& surface, QWidget* parent);
 
 }  // namespace etq

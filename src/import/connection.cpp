@@ -4,7 +4,7 @@
 
 #include "platform/settings_store.h"
 #include "platform/user_paths.h"
-#include "shell/settings_groups.h"
+#include "platform/settings_keys.h"
 
 namespace etq {
 
@@ -18,16 +18,9 @@ QString readParam(const SettingsStore& store, const QString& key) {
 
 }  // namespace
 
-ConnParams& connParams() {
-    static ConnParams params{
-        settingDefault(u"Params", u"ConnServer"), settingDefault(u"Params", u"ConnUID"),
-        settingDefault(u"Params", u"ConnPWD"), settingDefault(u"Params", u"ConnDataBase")};
-    return params;
-}
-
-void GetConnParams() {
-    const SettingsStore store(applicationName());
-    ConnParams& p = connParams();
+void GetConnParams(Context& context) {
+    const SettingsStore store(context.applicationName);
+    ConnParams& p = context.connection;
     p.server = readParam(store, QStringLiteral("ConnServer"));
     p.user = readParam(store, QStringLiteral("ConnUID"));
     p.password = readParam(store, QStringLiteral("ConnPWD"));
@@ -53,13 +46,13 @@ QString BuildConnString(const QString& server, const QString& user, const QStrin
     }
 }
 
-QString companyFolder() {
-    const ConnParams& p = connParams();
+QString companyFolder(const ConnParams& p) {
     return BuildConnString(p.server, p.user, p.password, p.database, 3);
 }
 
-void SetGetRegConnParams(quint8 action, QString& server, QString& database) {
-    SettingsStore store(applicationName());
+void SetGetRegConnParams(const QString& application, quint8 action, QString& server,
+                         QString& database) {
+    SettingsStore store(application);
     if (action == 1) {
         store.write(kParams, QStringLiteral("ConnServer"), server);
         store.write(kParams, QStringLiteral("ConnDataBase"), database);

@@ -3,10 +3,10 @@
 #include <QFileInfo>
 #include <functional>
 
-#include "import/connection.h"
 #include "import/host_reading.h"
 #include "import/public_functions.h"
-#include "shell/surface.h"
+#include "platform/failure.h"
+#include "platform/progress.h"
 
 namespace etq {
 
@@ -14,87 +14,77 @@ namespace {
 
 using namespace hostread;
 
-// A combo box of the reading-items tab and the host file its entries come from.
-struct HostList {
-    QStringView combo;
+// The host file a list's entries come from.
+struct ListFile {
     const host::HostLayout& layout;
-    host::HostField number;  // the entry's item data
+    host::HostField number;  // the entry's data
     host::HostField name;    // the entry's text
 };
 
-const HostList kPropertyGroups{u"cmbItmQGrp", host::oitg::kLayout, host::oitg::kNumber,
-                               host::oitg::kName};
-const HostList kItemGroups{u"cmbItmBelong", host::oitb::kLayout, host::oitb::kNumber,
-                           host::oitb::kName};
-const HostList kPriceLists{u"cmbPriceField", host::opln::kLayout, host::opln::kNumber,
-                           host::opln::kName};
-
-void fillCombo(const Surface& surface, const HostList& list) {
-    const QString path = hostFilePath(companyFolder(), list.layout);
-    if (!QFileInfo::exists(path)) return;
-    try {
-        const DbfFile file = openHostFile(path, list.layout);
-        const ControlRef combo = surface.control(list.combo.toString());
-        combo.clearList();
-        forEachRecord(file, [&](qint64 record) {
-            const QString name = file.text(record, list.name);
-            if (name.isEmpty()) return;
-            combo.addItem(name, wholeNumber16(file, record, list.number));
-        });
-    } catch (const std::exception& e) {
-        reportFailure(e);
+const ListFile& fileOf(HostList list) {
+    static const ListFile kPropertyGroups{host::oitg::kLayout, host::oitg::kNumber,
+                                          host::oitg::kName};
+    static const ListFile kItemGroups{host::oitb::kLayout, host::oitb::kNumber,
+                                      host::oitb::kName};
+    static const ListFile kPriceLists{host::opln::kLayout, host::opln::kNumber,
+                                      host::opln::kName};
+    switch (list) {
+        case HostList::PropertyGroups:
+            return kPropertyGroups;
+        case HostList::ItemGroups:
+            return kItemGroups;
+        case HostList::PriceLists:
+            break;
     }
+    return kPriceLists;
+}
+
+QString existingHostFile(const QString& companyFolder, const host::HostLayout& layout) {
+    const QString path = hostFilePath(companyFolder, layout);
+    if (!QFileInfo::exists(path))
+        throw HostFileMissing(QStringLiteral("There is no host file %1").arg(path));
+    return path;
 }
 
 // Runs a reader of a small reference file over the database at dbPath, in one transaction.
-// The host file is damaged: that is told. The database fails: the reader ends without a
-// message, as these readers always have, and the run that called it stops.
-bool readReferenceFile(
-    const Surface& surface, const QString& compPath, const QString& dbPath,
-    const host::HostLayout& layout,
-    const std::function<void(jet::Database&, const DbfFile&, ProgressBar&)>& read) {
-    ProgressBar bar(surface);
-    bar.clear();
-    const QString path = hostFilePath(compPath, layout);
-    if (!QFileInfo::exists(path)) return false;
+// The database failing is told on the command line only: the window has always passed over it.
+void readReferenceFile(
+    const QString& compPath, const QString& dbPath, const host::HostLayout& layout,
+    Progress& progress,
+    const std::function<void(jet::Database&, const DbfFile&, Progress&)>& read) {
+    progress.clear();
+    const QString path = existingHostFile(compPath, layout);
     try {
         jet::Database db = jet::Database::open(dbPath);
         const DbfFile file = openHostFile(path, layout);
         KeptWrites writes(db);
-        read(db, file, bar);
+        read(db, file, progress);
         writes.commit();
-    } catch (const DbfError& e) {
-        reportFailure(e);
-        return false;
-    } catch (const HostValueError& e) {
-        reportFailure(e);
-        return false;
-    } catch (const std::exception&) {
-        return false;
+    } catch (const jet::JetError& e) {
+        throw QuietFailure(QStringLiteral("Reading %1 into %2: %3").arg(path, dbPath, e.description()));
     }
-    bar.clear();
-    return true;
+    progress.clear();
 }
 
 }  // namespace
 
-void FillCmbItmQGrp(const Surface& surface) {
-    fillCombo(surface, kPropertyGroups);
+EntryList readHostList(const QString& companyFolder, HostList list) {
+    const ListFile& source = fileOf(list);
+    const DbfFile file = openHostFile(existingHostFile(companyFolder, source.layout), source.layout);
+    EntryList entries;
+    forEachRecord(file, [&](qint64 record) {
+        const QString name = file.text(record, source.name);
+        if (!name.isEmpty()) entries.append({name, wholeNumber16(file, record, source.number)});
+    });
+    return entries;
 }
 
-void FillCmbItmBelong(const Surface& surface) {
-    fillCombo(surface, kItemGroups);
-}
-
-void FillCmbPrice(const Surface& surface) {
-    fillCombo(surface, kPriceLists);
-}
-
-bool ReadCoinsMNHL(const Surface& surface, const QString& compPath, const QString& dbPath) {
+void readHostCurrencies(const QString& companyFolder, const QString& databasePath,
+                        Progress& progress) {
     namespace ocrn = host::ocrn;
-    return readReferenceFile(
-        surface, compPath, dbPath, ocrn::kLayout,
-        [](jet::Database& db, const DbfFile& file, ProgressBar& bar) {
+    readReferenceFile(
+        companyFolder, databasePath, ocrn::kLayout, progress,
+        [](jet::Database& db, const DbfFile& file, Progress& bar) {
             jet::Recordset currencies = db.openRecordset(QStringLiteral("tCurrencies"));
             auto setIfGiven = [&](const char* field, const QString& text) {
                 if (!text.isEmpty()) currencies.setValue(QString::fromLatin1(field), text);
@@ -125,12 +115,12 @@ bool ReadCoinsMNHL(const Surface& surface, const QString& compPath, const QStrin
         });
 }
 
-bool ReadSpecialPriceMNHL(const Surface& surface, const QString& compPath, const QString& dbPath,
-                          const QVariant& /*fromItemKey*/, const QVariant& /*toItemKey*/) {
+void readHostSpecialPrices(const QString& companyFolder, const QString& databasePath,
+                           Progress& progress) {
     namespace ospp = host::ospp;
-    return readReferenceFile(
-        surface, compPath, dbPath, ospp::kLayout,
-        [](jet::Database& db, const DbfFile& file, ProgressBar& bar) {
+    readReferenceFile(
+        companyFolder, databasePath, ospp::kLayout, progress,
+        [](jet::Database& db, const DbfFile& file, Progress& bar) {
             jet::Recordset prices = db.openRecordset(QStringLiteral("tTempAlterPrices"));
             forEachRecord(
                 file,

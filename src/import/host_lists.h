@@ -1,32 +1,40 @@
 #pragma once
 
 #include <QString>
-#include <QVariant>
+
+#include "platform/list_entry.h"
 
 // The host's small reference files: the lists the reading-items tab offers, its currencies and
 // its special prices per account.
 namespace etq {
 
-class Surface;
+class Progress;
 
-// Fill a combo box of the reading-items tab from the company folder of the current connection
-// parameters: the entry's text is the name, its item data the number. A missing file leaves
-// the combo as it was; records with a blank name add nothing. A damaged file is reported.
-void FillCmbItmQGrp(const Surface& surface);    // cmbItmQGrp, item property groups (oitg.dbf)
-void FillCmbItmBelong(const Surface& surface);  // cmbItmBelong, item groups (oitb.dbf)
-void FillCmbPrice(const Surface& surface);      // cmbPriceField, price lists (opln.dbf)
+// The lists of the company folder the item import chooses from.
+enum class HostList {
+    PropertyGroups,  // item property groups (oitg.dbf): the query group rule's bit
+    ItemGroups,      // item groups (oitb.dbf)
+    PriceLists,      // price lists (opln.dbf): the price field
+};
 
-// Brings the host's currencies (ocrn.dbf in compPath) into tCurrencies of the database at
-// dbPath: a code found is edited, a new one added; blank host texts leave the stored ones.
-// True when the file was read to its end; false when it is missing or the reading failed
-// (a damaged file is reported, a database failure ends the reader without a message).
-bool ReadCoinsMNHL(const Surface& surface, const QString& compPath, const QString& dbPath);
+// The entries of a list: the name as text, the number as data. Records with a blank name add
+// nothing. Throws HostFileMissing when the file is not there, HostFileDamaged or HostValueError
+// when it cannot be read.
+EntryList readHostList(const QString& companyFolder, HostList list);
 
-// Stages the host's special prices (ospp.dbf in compPath) in tTempAlterPrices of the temporary
-// items database at dbPath; the merge moves them on. Records without an item or an account
-// key are passed over, and so is a second price for the same account and item. fromItemKey
-// and toItemKey are accepted and filter nothing. Results and failures as ReadCoinsMNHL.
-bool ReadSpecialPriceMNHL(const Surface& surface, const QString& compPath, const QString& dbPath,
-                          const QVariant& fromItemKey, const QVariant& toItemKey);
+// Brings the host's currencies (ocrn.dbf) into tCurrencies of the database at databasePath: a
+// code found is edited, a new one added; blank host texts leave the stored ones. The local
+// currency gets the shekel sign. Throws HostFileMissing for a missing file, HostFileDamaged or
+// HostValueError for a file that cannot be read, and QuietFailure when the database refuses
+// (the window has always passed over that); what was written before stays.
+void readHostCurrencies(const QString& companyFolder, const QString& databasePath,
+                        Progress& progress);
+
+// Stages the host's special prices (ospp.dbf) in tTempAlterPrices of the temporary items
+// database at databasePath; the merge moves them on. Records without an item or an account key
+// are passed over, and so is a second price for the same account and item. Failures as
+// readHostCurrencies.
+void readHostSpecialPrices(const QString& companyFolder, const QString& databasePath,
+                           Progress& progress);
 
 }  // namespace etq

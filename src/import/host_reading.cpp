@@ -6,9 +6,7 @@
 #include "db/file_names.h"
 #include "jet/error.h"
 #include "jet/vb.h"
-#include "platform/messages.h"
-#include "shell/captions.h"
-#include "shell/surface.h"
+#include "platform/log.h"
 
 namespace etq::hostread {
 
@@ -70,34 +68,18 @@ bool updateUnlessDuplicate(jet::Recordset& recordset) {
     }
 }
 
-std::optional<qint16> selectedNumber(const ControlRef& combo) {
-    if (combo.listIndex() < 0) return std::nullopt;
-    const int data = combo.selectedItemData();
-    if (const auto number = vb::toInteger(data)) return number;
-    jet::fail(jet::err::kOverflow,
-              QStringLiteral("The entry chosen in %1 stands for %2, beyond a 16-bit number.")
-                  .arg(combo.name())
-                  .arg(data));
-}
-
-bool isChecked(const Surface& surface, const QString& name) {
-    return surface.control(name).value().toInt() == 1;
-}
-
-void reportFailure(const std::exception& failure) {
-    showCritical(QString::fromUtf8(failure.what()), GetCaption(1));
-}
-
 KeptWrites::~KeptWrites() {
     if (!open_) return;
-    // The reader is on its way out with a failure it reports itself. Keep what it wrote; should
-    // even that fail, nothing of the transaction stays, so no row is left half-written.
+    // The reader is on its way out with a failure its caller reports. Keep what it wrote;
+    // should even that fail, nothing of the transaction stays, so no row is left half-written.
     try {
         db_.commitTrans();
-    } catch (const std::exception&) {
+    } catch (const std::exception& e) {
+        qCWarning(log::import) << "keeping the rows read before the failure:" << describe(e);
         try {
             db_.rollback();
-        } catch (const std::exception&) {
+        } catch (const std::exception& again) {
+            qCWarning(log::import) << "rolling back:" << describe(again);
         }
     }
 }

@@ -1,8 +1,8 @@
 #pragma once
 
 // What the host readers share: finding and opening a host file, walking its records, reading
-// numbers out of its decimal fields, quoting keys into find criteria, keeping the writes of a
-// run in one transaction, and reporting a failure.
+// numbers out of its decimal fields, quoting keys into find criteria and keeping the writes of a
+// run in one transaction.
 
 #include <QString>
 #include <exception>
@@ -11,14 +11,12 @@
 
 #include "import/dbf_file.h"
 #include "import/host_layouts.h"
-#include "import/progress_bar.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
+#include "platform/failure.h"
+#include "platform/progress.h"
 
 namespace etq {
-
-class ControlRef;
-class Surface;
 
 namespace hostread {
 
@@ -26,13 +24,6 @@ namespace hostread {
 inline const QString kLocalCurrency = QStringLiteral("\u00A6");  // "¦"
 // The sign labels show for the local currency, whatever sign the host keeps for it.
 inline const QString kLocalCurrencySign = QStringLiteral("\u20AA");  // "₪"
-
-// A field of a host record that does not hold what it should: a group number that is no
-// number, say. The message names the file, the record and the field.
-class HostValueError : public std::runtime_error {
-  public:
-    explicit HostValueError(const QString& message) : std::runtime_error(message.toStdString()) {}
-};
 
 // The host file of `layout` in the company folder.
 QString hostFilePath(const QString& companyFolder, const host::HostLayout& layout);
@@ -42,9 +33,9 @@ QString hostFilePath(const QString& companyFolder, const host::HostLayout& layou
 DbfFile openHostFile(const QString& path, const host::HostLayout& layout);
 
 // Calls read(record) for every record in file order. Records marked deleted are not read, but
-// they count like the others: with a bar, it moves after every `every` records.
+// they count like the others: with a progress, it moves after every `every` records.
 template <class Read>
-void forEachRecord(const DbfFile& file, Read&& read, ProgressBar* bar = nullptr, int every = 1) {
+void forEachRecord(const DbfFile& file, Read&& read, Progress* bar = nullptr, int every = 1) {
     const qint64 count = file.recordCount();
     for (qint64 record = 0; record < count; ++record) {
         if (!file.isDeleted(record)) read(record);
@@ -65,16 +56,6 @@ QString criterionLiteral(const QString& text, QChar quote);
 // Writes the pending row. A duplicate key is passed over as the readers always have: the row
 // is dropped and false returned. Any other failure throws.
 bool updateUnlessDuplicate(jet::Recordset& recordset);
-
-// The item data of the combo's selected entry as a 16-bit number; nothing when none is chosen.
-// Throws JetError (overflow) for item data beyond 16 bits.
-std::optional<qint16> selectedNumber(const ControlRef& combo);
-
-// Whether the check box `name` of the surface is checked (value 1).
-bool isChecked(const Surface& surface, const QString& name);
-
-// The critical message of a failure: its description, titled with caption 1 ("Error").
-void reportFailure(const std::exception& failure);
 
 // The writes of one reader, in one transaction. When the reader stops early the rows written
 // before the failure are kept, as they always were; commit() ends the transaction normally.

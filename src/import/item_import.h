@@ -2,25 +2,33 @@
 
 #include <QString>
 
+#include "import/item_reader.h"
+
 namespace etq {
 
-class Surface;
+class Context;
+class Progress;
 
-// Empties the item tables before an import, as the surface's boxes say: tItems when ChkClean
-// is checked, and tAlterPrices too when ChkImportAlterPrices is checked as well. itemDbPath is
-// the item database. A failure throws to the caller.
-void CleanTables(const Surface& surface, const QString& itemDbPath);
+// What an item import run does: where, from where, and what it reads.
+struct ItemImportOptions {
+    QString databaseFolder;  // the local databases
+    QString companyFolder;   // the host's company folder
+    bool clean = false;      // empty tItems first (and tAlterPrices with specialPrices)
+    bool specialPrices = false;
+    // The item reading: key range, groups, names, copies, price field and price lists. Its
+    // company folder and database are the run's own.
+    ItemReadOptions items;
+};
 
-// The item import run of CmdImportItems, with the values of the reading-items tab and the
-// database folder txtDBPath: prepares the item and temporary items databases, reads items,
-// currencies and (when asked) special prices from the company folder of the connection
-// parameters, merges the staged rows into the item database and makes sure the working
-// database exists. Message1 tells each step and the progress bar moves.
+// The item import run: prepares the item and temporary items databases, reads items,
+// currencies and (when asked) special prices from the company folder, merges the staged rows
+// into the item database and makes sure the working database exists. Each step is shown as
+// the progress's step (captions 31 to 38 in the context's language) and the bar moves.
 //
-// True when the run reached its end (Message1 shows caption 38, "Scan is finished"). False
-// when it stopped early: the step that stopped it has reported why, or stopped without a word
-// where the readers always have (a missing oitm.dbf, a currency database that cannot be
-// written). What was written before the stop is kept.
-bool ImportItems(const Surface& surface);
+// Returns when the run reached its end (the step then shows caption 38, "Scan is finished").
+// A failure throws and ends the run at that step: the engine's JetError or a Failure, among
+// them those the window has always passed over without a word (a missing oitm.dbf, a currency
+// database that cannot be written). What was written before the stop is kept.
+void importItems(const ItemImportOptions& options, const Context& context, Progress& progress);
 
 }  // namespace etq

@@ -6,7 +6,8 @@
 #include "import/host_reading.h"
 #include "import/public_functions.h"
 #include "jet/error.h"
-#include "shell/surface.h"
+#include "platform/failure.h"
+#include "platform/progress.h"
 
 namespace etq {
 
@@ -15,47 +16,10 @@ namespace {
 using namespace hostread;
 namespace oitm = host::oitm;
 
-// The query group rule: a bit of the item's query group mask decides IgnoreInDoc.
-struct QueryGroupRule {
-    int bit = 1;  // 1 is the lowest bit
-    // cmbItmQGrpBy at index 1: items with the bit set are left out of document labels;
-    // otherwise the items without it are.
-    bool ignoreWhenSet = false;
-
-    bool ignoreInDoc(qint32 mask) const {
-        const bool set = bit >= 1 && bit <= 32 && ((quint32(mask) >> (bit - 1)) & 1u);
-        return ignoreWhenSet ? set : !set;
-    }
-};
-
-// Which host items a run reads, as the boxes of the reading-items tab say.
-struct ItemSelection {
-    QString fromKey;  // empty: no lower bound
-    QString toKey;    // empty: no upper bound
-    std::optional<qint16> group;
-    std::optional<QueryGroupRule> queryGroup;
-
-    // Keys compare by character codes, not by the collating order: "2" is after "100".
-    bool admitsKey(const QString& key) const {
-        if (!fromKey.isEmpty() && QString::compare(key, fromKey, Qt::CaseSensitive) < 0)
-            return false;
-        return toKey.isEmpty() || QString::compare(key, toKey, Qt::CaseSensitive) <= 0;
-    }
-};
-
-ItemSelection readSelection(const Surface& surface) {
-    ItemSelection selection;
-    selection.fromKey = surface.control(QStringLiteral("txtFromItemKey")).text().trimmed();
-    selection.toKey = surface.control(QStringLiteral("txtToItemKey")).text().trimmed();
-    if (isChecked(surface, QStringLiteral("chkItmBelong")))
-        selection.group = selectedNumber(surface.control(QStringLiteral("cmbItmBelong")));
-    if (isChecked(surface, QStringLiteral("chkItmQGrp"))) {
-        const std::optional<qint16> bit =
-            selectedNumber(surface.control(QStringLiteral("cmbItmQGrp")));
-        const int by = surface.control(QStringLiteral("cmbItmQGrpBy")).listIndex();
-        if (bit && by >= 0) selection.queryGroup = QueryGroupRule{*bit, by == 1};
-    }
-    return selection;
+bool admitsKey(const ItemReadOptions& options, const QString& key) {
+    if (!options.fromKey.isEmpty() && QString::compare(key, options.fromKey, Qt::CaseSensitive) < 0)
+        return false;
+    return options.toKey.isEmpty() || QString::compare(key, options.toKey, Qt::CaseSensitive) <= 0;
 }
 
 int fieldIndex(const jet::Recordset& recordset, const char* name) {
@@ -95,13 +59,6 @@ struct PriceListFields {
     int key, list, price, currency;
 };
 
-struct ItemReadOptions {
-    bool foreignNames = false;
-    qint16 copies = 0;
-    int priceField = 1;
-    bool stagePriceLists = false;
-};
-
 // A price entry of the item file: the price in currency units and its currency.
 struct Price {
     qint32 hundredths = 0;
@@ -116,9 +73,8 @@ Price priceEntry(const DbfFile& file, qint64 record, int n) {
 // Reads host item records into tItems (and tTempPriceList) of an open database.
 class ItemImport {
   public:
-    ItemImport(jet::Database& db, const ItemSelection& selection, const ItemReadOptions& options)
-        : selection_(selection),
-          options_(options),
+    ItemImport(jet::Database& db, const ItemReadOptions& options)
+        : options_(options),
           items_(db.openRecordset(QStringLiteral("tItems"))),
           fields_(items_) {
         if (!items_.eof()) items_.moveFirst();
@@ -130,10 +86,10 @@ class ItemImport {
 
     void read(const DbfFile& file, qint64 record) {
         const QString hostKey = file.text(record, oitm::kItemKey);
-        if (hostKey.isEmpty() || !selection_.admitsKey(hostKey)) return;
+        if (hostKey.isEmpty() || !admitsKey(options_, hostKey)) return;
         const QString group = file.text(record, oitm::kGroup);
-        if (selection_.group && !group.isEmpty() &&
-            wholeNumber16(file, record, oitm::kGroup) != *selection_.group)
+        if (options_.group && !group.isEmpty() &&
+            wholeNumber16(file, record, oitm::kGroup) != *options_.group)
             return;
         const QString key = QuoteToApostrophe(hostKey);
 
@@ -174,8 +130,8 @@ class ItemImport {
         items_.setValue(fields_.coin, price.currency);
         items_.setValue(fields_.salesPack, 1.0);
         items_.setValue(fields_.purchasePack, 1.0);
-        if (selection_.queryGroup && !file.text(record, oitm::kQueryGroups).isEmpty())
-            items_.setValue(fields_.ignoreInDoc, selection_.queryGroup->ignoreInDoc(wholeNumber32(
+        if (options_.queryGroup && !file.text(record, oitm::kQueryGroups).isEmpty())
+            items_.setValue(fields_.ignoreInDoc, options_.queryGroup->ignoreInDoc(wholeNumber32(
                                                      file, record, oitm::kQueryGroups)));
     }
 
@@ -194,7 +150,6 @@ class ItemImport {
         }
     }
 
-    const ItemSelection& selection_;
     const ItemReadOptions& options_;
     jet::Recordset items_;
     ItemFields fields_;
@@ -213,33 +168,27 @@ void requirePriceField(int priceField, const QString& path) {
 
 }  // namespace
 
-bool ReadItemMNHL(const Surface& surface, const QString& compPath, const QString& dbPath,
-                  const QVariant& /*fromItemKey*/, const QVariant& /*toItemKey*/, qint16 getForeign,
-                  qint16 copies, qint16 priceField, bool /*importPackUnits*/, bool /*byDocs*/,
-                  bool importPriceLists) {
-    ProgressBar bar(surface);
-    try {
-        bar.clear();
-        const ItemSelection selection = readSelection(surface);
-        const QString path = hostFilePath(compPath, oitm::kLayout);
-        if (!QFileInfo::exists(path)) return false;
+bool QueryGroupRule::ignoreInDoc(qint32 mask) const {
+    const bool set = bit >= 1 && bit <= 32 && ((quint32(mask) >> (bit - 1)) & 1u);
+    return ignoreWhenSet ? set : !set;
+}
 
-        jet::Database db = jet::Database::open(dbPath);
-        const ItemReadOptions options{getForeign != 0, copies, priceField, importPriceLists};
-        ItemImport import(db, selection, options);
-        const DbfFile file = openHostFile(path, oitm::kLayout);
-        requirePriceField(priceField, path);
+void readHostItems(const ItemReadOptions& options, Progress& progress) {
+    progress.clear();
+    const QString path = hostFilePath(options.companyFolder, oitm::kLayout);
+    if (!QFileInfo::exists(path))
+        throw HostFileMissing(QStringLiteral("There is no item file %1").arg(path));
 
-        KeptWrites writes(db);
-        forEachRecord(
-            file, [&](qint64 record) { import.read(file, record); }, &bar, 5);
-        writes.commit();
-    } catch (const std::exception& e) {
-        reportFailure(e);
-        return false;
-    }
-    bar.clear();
-    return true;
+    jet::Database db = jet::Database::open(options.databasePath);
+    ItemImport import(db, options);
+    const DbfFile file = openHostFile(path, oitm::kLayout);
+    requirePriceField(options.priceField, path);
+
+    KeptWrites writes(db);
+    forEachRecord(
+        file, [&](qint64 record) { import.read(file, record); }, &progress, 5);
+    writes.commit();
+    progress.clear();
 }
 
 }  // namespace etq

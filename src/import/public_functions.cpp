@@ -6,7 +6,6 @@
 namespace etq {
 
 namespace {
-QString g_addressSeparator = QStringLiteral("\r\n");
 
 QString trimBlanks(const QString& text) {
     qsizetype from = 0, to = text.size();
@@ -46,17 +45,10 @@ double NullToDouble(const QVariant& value) {
     return *d;
 }
 
-void setAddressSeparator(const QString& separator) {
-    g_addressSeparator = separator;
-}
-QString addressSeparator() {
-    return g_addressSeparator;
-}
-
-QString ReplaceLineBreaks(const QVariant& value) {
+QString ReplaceLineBreaks(const QVariant& value, const QString& separator) {
     if (value.isNull() || !value.isValid()) return {};
     QString text = vb::toText(value);
-    text.replace(u'\r', g_addressSeparator);
+    text.replace(u'\r', separator);
     return text;
 }
 

@@ -17,12 +17,10 @@ QString QuoteToApostrophe(const QString& text);
 // Null gives 0; anything else the value as a number (a text that is no number throws
 // JetError 3464).
 double NullToDouble(const QVariant& value);
-// Every carriage return becomes the address separator; Null gives empty text.
-QString ReplaceLineBreaks(const QVariant& value);
-// The separator between the lines of an address: carriage return and line feed, or a comma,
-// as the document import run chooses.
-void setAddressSeparator(const QString& separator);
-QString addressSeparator();
+// Every carriage return becomes `separator`, the separator between the lines of an address that
+// the document import run chooses (CR LF, or a comma; a run keeps it in its Context). Null gives
+// empty text.
+QString ReplaceLineBreaks(const QVariant& value, const QString& separator);
 // The binary digits of a whole number, most significant first ("100" for 4, "0" for 0).
 QString ToBinaryText(qint32 value);
 // Trimmed numeric text as a 32-bit whole number; anything else 0.

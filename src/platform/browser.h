@@ -23,9 +23,4 @@ class HeadlessPageViewer : public PageViewer {
     bool open_;
 };
 
-// The viewer in use. Until one is installed, pages go to a HeadlessPageViewer that only prints.
-PageViewer& pageViewer();
-// Installs a viewer (not owned); nullptr restores the default.
-void setPageViewer(PageViewer* viewer);
-
 }  // namespace etq

@@ -5,7 +5,6 @@
 namespace etq {
 
 namespace {
-MessageSink* g_sink = nullptr;
 
 const char* iconWord(MsgIcon icon) {
     switch (icon) {
@@ -37,21 +36,12 @@ MsgAnswer StderrMessageSink::show(const Message& message) {
     return MsgAnswer::Ok;
 }
 
-MessageSink& messages() {
-    static StderrMessageSink fallback;
-    return g_sink ? *g_sink : fallback;
+void showCritical(MessageSink& sink, const QString& text, const QString& title) {
+    sink.show({text, title, MsgIcon::Critical, MsgButtons::Ok});
 }
 
-void setMessageSink(MessageSink* sink) {
-    g_sink = sink;
-}
-
-void showCritical(const QString& text, const QString& title) {
-    messages().show({text, title, MsgIcon::Critical, MsgButtons::Ok});
-}
-
-MsgAnswer askYesNo(const QString& text, const QString& title, MsgIcon icon) {
-    return messages().show({text, title, icon, MsgButtons::YesNo});
+MsgAnswer askYesNo(MessageSink& sink, const QString& text, const QString& title, MsgIcon icon) {
+    return sink.show({text, title, icon, MsgButtons::YesNo});
 }
 
 }  // namespace etq

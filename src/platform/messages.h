@@ -4,7 +4,7 @@
 
 namespace etq {
 
-// The component's message boxes. Routines report through messages(); the windows install a
+// The component's message boxes. A run's Context holds the sink in use: the windows give it a
 // box that shows them, a headless run writes them on stderr and answers with the default.
 enum class MsgIcon { None, Critical, Question, Exclamation, Information };
 enum class MsgButtons { Ok, YesNo };
@@ -33,13 +33,9 @@ class StderrMessageSink : public MessageSink {
     MsgAnswer answer_;
 };
 
-// The sink in use. Until one is installed, messages go to stderr.
-MessageSink& messages();
-// Installs a sink (not owned); nullptr restores the stderr sink.
-void setMessageSink(MessageSink* sink);
-
 // Shorthand for the most common report: the failure's text, the critical icon and a title.
-void showCritical(const QString& text, const QString& title);
-MsgAnswer askYesNo(const QString& text, const QString& title, MsgIcon icon = MsgIcon::Question);
+void showCritical(MessageSink& sink, const QString& text, const QString& title);
+MsgAnswer askYesNo(MessageSink& sink, const QString& text, const QString& title,
+                   MsgIcon icon = MsgIcon::Question);
 
 }  // namespace etq

@@ -7,7 +7,6 @@ namespace etq {
 namespace {
 
 const QString kOrganisation = QStringLiteral("Etiquon");
-QString g_applicationName = QStringLiteral("Etiquon");
 
 QString storeKey(const QString& section, const QString& key) {
     return section + QLatin1Char('/') + key;
@@ -80,14 +79,6 @@ QString readSetting(const QString& application, const QString& section, const QS
 void writeSetting(const QString& application, const QString& section, const QString& key,
                   const QString& value) {
     SettingsStore(application).write(section, key, value);
-}
-
-QString applicationName() {
-    return g_applicationName;
-}
-
-void setApplicationName(const QString& name) {
-    g_applicationName = name;
 }
 
 QString applicationNameFor(const QString& settingId) {

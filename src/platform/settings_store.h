@@ -43,11 +43,6 @@ QString readSetting(const QString& application, const QString& section, const QS
 void writeSetting(const QString& application, const QString& section, const QString& key,
                   const QString& value);
 
-// The application name every setting of this run is kept under. "Etiquon" until start-up sets
-// it from the hosting page's SettingID.
-QString applicationName();
-void setApplicationName(const QString& name);
-
 // "Etiquon", followed by the trimmed SettingID when that text is a number, so that several
 // hosting pages keep separate settings.
 QString applicationNameFor(const QString& settingId);

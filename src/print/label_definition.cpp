@@ -5,6 +5,7 @@
 #include <variant>
 
 #include "jet/vb.h"
+#include "platform/context.h"
 #include "platform/settings_store.h"
 
 namespace etq {
@@ -141,10 +142,16 @@ void moveValue(quint8 action, SettingsStore& store, const QString& section, cons
 
 }  // namespace
 
-LabelDefinition& labelDefinition() {
-    static LabelDefinition definition;
-    return definition;
+}  // namespace etq
+
+// The context holds the definition; its type is this layer's, so the context's accessor is
+// defined here.
+etq::LabelDefinition& etq::Context::labelDefinition() {
+    if (!labelDefinition_) labelDefinition_ = std::make_shared<LabelDefinition>();
+    return *labelDefinition_;
 }
+
+namespace etq {
 
 void GetSetLabelValue(quint8 action, SettingsStore& store, const QString& section,
                       const QString& key, bool& value, const QString& defaultText) {
@@ -167,8 +174,8 @@ void GetSetLabelValue(quint8 action, SettingsStore& store, const QString& sectio
     moveValue(action, store, section, key, value, defaultText);
 }
 
-void GetSetLabelDef(quint8 action, LabelDefinition& definition) {
-    SettingsStore store(applicationName());
+void GetSetLabelDef(quint8 action, const QString& application, LabelDefinition& definition) {
+    SettingsStore store(application);
     for (int i = 0; i < kLabelCellCount; ++i)
         moveSection(action, store, QString::number(i) + QStringLiteral("LabelDef"),
                     definition.cells[size_t(i)], kCellKeys);

@@ -65,17 +65,13 @@ struct LabelDefinition {
     DirectLabelDef page;
 };
 
-// The one definition of the running component, shared by the control, the designer and the
-// page writer.
-LabelDefinition& labelDefinition();
-
 enum LabelDefAction : quint8 { SaveLabelDef = 1, LoadLabelDef = 2 };
 
-// Writes (1) the definition to the settings store of the current application name, or reads it
+// Writes (1) the definition to the settings store of `application`, or reads it
 // (2): the cell sections 0LabelDef to 6LabelDef, then "LabelBar" only while BarType is not
 // negative, then "DirectLabel". A value that does not convert to its field's type leaves the
 // field as it was; nothing is reported.
-void GetSetLabelDef(quint8 action, LabelDefinition& definition = labelDefinition());
+void GetSetLabelDef(quint8 action, const QString& application, LabelDefinition& definition);
 
 // Moves one value. Writing stores the value as text, booleans as "-1" and "0". Reading takes
 // the stored text (or `defaultText`) into the field; "True" and "False" read as -1 and 0.

@@ -1,7 +1,6 @@
 #include "print/label_page.h"
 
 #include <QFile>
-#include <cmath>
 #include <exception>
 #include <stdexcept>
 #include <thread>
@@ -9,21 +8,18 @@
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "jet/vb.h"
-#include "platform/browser.h"
-#include "platform/messages.h"
 #include "platform/page_file.h"
+#include "platform/progress.h"
 #include "platform/print_folder.h"
 #include "platform/user_paths.h"
 #include "print/barcode_images.h"
-#include "print/label_fields.h"
+#include "platform/label_fields.h"
 #include "print/label_query.h"
-#include "shell/surface.h"
 
 namespace etq {
 
 namespace {
 
-const QString kFailureTitle = QStringLiteral("תקלה");
 constexpr quint8 kTextCell = 0;
 constexpr quint8 kBarcodeCell = 1;
 
@@ -100,21 +96,21 @@ void writeHead(PageFile& page, const LabelDefinition& def) {
     page.writeLine(u" BGCOLOR='#FFFFFF'>");
 }
 
-// Gives every cell in use its query column and price flag, and ticks its field on the label
-// tab so that the query selects the column.
-void prepareCells(Surface& surface, LabelDefinition& def) {
+// Gives every cell in use its query column and price flag, and ticks its field so that the query
+// selects the column.
+void prepareCells(LabelQueryInput& query, LabelDefinition& def) {
     for (int i = 0; i < kLabelCellCount; ++i) {
         LabelCell& cell = def.cells[size_t(i)];
         if (!cell.UseCell) continue;
         const LabelFieldSlot& slot = slotOfCell(cell, i);
         cell.FieldName = slot.column.toString();
         cell.IsPrice = fieldFormat(slot.formatTag) == FieldFormat::Price;
-        surface.control(QStringLiteral("ChkFldSend"), cell.FldID).setValue(1);
+        query.fieldChecks[size_t(cell.FldID)] = true;
     }
 }
 
-QString priceFormatOf(const Surface& surface) {
-    const QString format = surface.control(QStringLiteral("txtPriceFormat")).text().trimmed();
+QString priceFormatOf(const QString& given) {
+    const QString format = given.trimmed();
     return format.isEmpty() ? QStringLiteral("0.00") : format;
 }
 
@@ -126,8 +122,9 @@ QString percentOf(qint16 parts) {
 // Writes the labels: one position per copy of each record, row by row, sheet by sheet.
 class LabelWriter {
   public:
-    LabelWriter(Surface& surface, const LabelDefinition& def, PageFile& page)
-        : surface_(surface), def_(def), page_(page), priceFormat_(priceFormatOf(surface)) {
+    LabelWriter(const QString& priceFormat, const LabelDefinition& def, PageFile& page,
+                Progress& progress)
+        : progress_(progress), def_(def), page_(page), priceFormat_(priceFormatOf(priceFormat)) {
         imageAttributes_ = QStringLiteral(" ");
         if (def.bar.UserResoX > 0)
             imageAttributes_ += QStringLiteral(" width=") + QString::number(def.bar.UserResoX);
@@ -146,16 +143,13 @@ class LabelWriter {
         const qint64 perSheet = qint64(def_.page.PageRows) * def_.page.PageCols;
         const qint64 sheets = (total + perSheet - 1) / perSheet;
 
-        const ControlRef fill = surface_.control(QStringLiteral("ProgressFill"));
-        const int frameWidth = surface_.control(QStringLiteral("ProgressFrame")).width();
-        fill.setWidth(0);
+        progress_.clear();
         rs.moveFirst();
         recordNo_ = 1;
         enterRecord(rs);
         for (qint64 sheet = 1; sheet <= sheets; ++sheet) {
             writeSheet(rs);
-            if (recordNo_ % 5 == 0)
-                fill.setWidth(int(std::lround(double(recordNo_) / double(total) * frameWidth)));
+            if (recordNo_ % 5 == 0) progress_.show(recordNo_, total);
         }
     }
 
@@ -246,7 +240,7 @@ class LabelWriter {
         return text;
     }
 
-    Surface& surface_;
+    Progress& progress_;
     const LabelDefinition& def_;
     PageFile& page_;
     QString priceFormat_;
@@ -261,32 +255,15 @@ class LabelWriter {
     QStringList recordRows_;
 };
 
-// The failure's own description, for the message box.
-QString describe(const std::exception& e) {
-    if (const auto* jetError = dynamic_cast<const jet::JetError*>(&e))
-        return jetError->description();
-    return QString::fromUtf8(e.what());
-}
-
-void reportRefusedBarcodes(const QStringList& refused) {
-    constexpr int kShown = 10;
-    QString text = QStringLiteral("%1 labels have no barcode:").arg(refused.size());
-    for (int i = 0; i < refused.size() && i < kShown; ++i)
-        text += u'\n' + refused[i];
-    if (refused.size() > kShown)
-        text += QStringLiteral("\n... and %1 more").arg(refused.size() - kShown);
-    messages().show({text, kFailureTitle, MsgIcon::Exclamation, MsgButtons::Ok});
-}
-
 }  // namespace
 
-void CreateLabFile(Surface& surface, const QString& fileName, const QString& dbName,
-                   quint8 queryType, quint8 orderBy, LabelDefinition& def) {
+void writeLabelPage(const QString& fileName, const QString& dbName, LabelPageInput& input,
+                    LabelDefinition& def, Progress& progress) {
     if (def.page.PageRows <= 0 || def.page.PageCols <= 0)
         failWith(QStringLiteral("The label page has %1 rows and %2 columns; both must be above 0")
                      .arg(def.page.PageRows)
                      .arg(def.page.PageCols));
-    prepareCells(surface, def);
+    prepareCells(input.query, def);
     if (QFile::exists(fileName) && !QFile::remove(fileName))
         failWith(QStringLiteral("Cannot delete %1").arg(fileName));
     PageFile page;
@@ -294,69 +271,59 @@ void CreateLabFile(Surface& surface, const QString& fileName, const QString& dbN
     writeHead(page, def);
 
     jet::Database db = jet::Database::open(dbName);
-    const QString sql = BuildLabelQuery(labelQueryInput(surface, queryType, orderBy));
-    jet::Recordset rs = db.openRecordset(sql);
+    jet::Recordset rs = db.openRecordset(BuildLabelQuery(input.query));
     if (rs.bof() && rs.eof()) {
         page.close();
         return;
     }
-    LabelWriter(surface, def, page).write(rs);
+    LabelWriter(input.priceFormat, def, page, progress).write(rs);
     page.writeLine(u"</BODY>");
     page.writeLine(u"</HTML>");
     page.close();
-    surface.control(QStringLiteral("ProgressFill")).setWidth(0);
+    progress.clear();
 }
 
-QString PrintBuiltInLabels(Surface& surface, const QString& dbName, quint8 queryType,
-                           LabelDefinition& def) {
-    QString pagePath;
-    BarcodeRun barcodes;
-    try {
-        const quint8 orderBy = labelOrder(surface);
-        // Built before the page ticks the cells' fields, as the page's own query is later.
-        const QString sql = BuildLabelQuery(labelQueryInput(surface, queryType, orderBy));
-        const QString folder = printFolder();
-        deleteFilesIn(folder);
+BuiltInPrint printBuiltInLabels(const QString& dbName, LabelPageInput& input,
+                                LabelDefinition& def, Progress& progress) {
+    // Built before the page ticks the cells' fields, as the page's own query is later.
+    const QString sql = BuildLabelQuery(input.query);
+    const QString folder = printFolder();
+    deleteFilesIn(folder);
 
-        // Every barcode cell's values are read first, so that a failing query ends the run
-        // before the page is begun.
-        std::vector<BarcodeBatch> batches;
-        if (def.bar.BarType >= 0) {
-            for (int i = 0; i < kLabelCellCount; ++i) {
-                const LabelCell& cell = def.cells[size_t(i)];
-                if (cell.ViewType != kBarcodeCell || !cell.UseCell || cell.FldID < 0) continue;
-                batches.push_back(collectBarcodes(folder, slotOfCell(cell, i).column.toString(),
-                                                  cell.FldID, dbName, sql, def.bar));
-            }
+    // Every barcode cell's values are read first, so that a failing query ends the run before
+    // the page is begun.
+    std::vector<BarcodeBatch> batches;
+    if (def.bar.BarType >= 0) {
+        for (int i = 0; i < kLabelCellCount; ++i) {
+            const LabelCell& cell = def.cells[size_t(i)];
+            if (cell.ViewType != kBarcodeCell || !cell.UseCell || cell.FldID < 0) continue;
+            batches.push_back(collectBarcodes(folder, slotOfCell(cell, i).column.toString(),
+                                              cell.FldID, dbName, sql, def.bar));
         }
-        // The bitmaps are written beside the page while it is written; both are done before
-        // the browser is asked to show it.
-        std::exception_ptr bitmapFailure;
-        std::thread bitmaps([&] {
-            try {
-                barcodes =
-                    writeBarcodes(batches, int(std::max(1u, std::thread::hardware_concurrency())));
-            } catch (...) {
-                bitmapFailure = std::current_exception();
-            }
-        });
-        pagePath = joinPath(folder, kLabelPageFile);
-        try {
-            CreateLabFile(surface, pagePath, dbName, queryType, orderBy, def);
-        } catch (...) {
-            bitmaps.join();
-            throw;
-        }
-        bitmaps.join();
-        if (bitmapFailure) std::rethrow_exception(bitmapFailure);
-    } catch (const std::exception& e) {
-        showCritical(describe(e), kFailureTitle);
-        return {};
     }
-    QString error;
-    if (!pageViewer().showPage(pagePath, &error)) showCritical(error, kFailureTitle);
-    if (!barcodes.refused.isEmpty()) reportRefusedBarcodes(barcodes.refused);
-    return pagePath;
+    // The bitmaps are written beside the page while it is written; both are done before the
+    // run ends.
+    BarcodeRun barcodes;
+    std::exception_ptr bitmapFailure;
+    std::thread bitmaps([&] {
+        try {
+            barcodes =
+                writeBarcodes(batches, int(std::max(1u, std::thread::hardware_concurrency())));
+        } catch (...) {
+            bitmapFailure = std::current_exception();
+        }
+    });
+    BuiltInPrint print{joinPath(folder, kLabelPageFile), {}};
+    try {
+        writeLabelPage(print.pagePath, dbName, input, def, progress);
+    } catch (...) {
+        bitmaps.join();
+        throw;
+    }
+    bitmaps.join();
+    if (bitmapFailure) std::rethrow_exception(bitmapFailure);
+    print.refusedBarcodes = barcodes.refused;
+    return print;
 }
 
 }  // namespace etq

@@ -1,7 +1,6 @@
 #include "print/label_query.h"
 
 #include "db/db_values.h"
-#include "shell/surface.h"
 
 namespace etq {
 
@@ -163,26 +162,6 @@ QString BuildLabelQuery(const LabelQueryInput& in) {
         sql += QStringLiteral(" ORDER BY tItems.Itemkey ") + direction;
     }
     return sql;
-}
-
-LabelQueryInput labelQueryInput(const Surface& surface, quint8 queryType, quint8 order) {
-    LabelQueryInput in;
-    in.queryType = queryType;
-    in.order = order;
-    in.useAccountKey = surface.control(QStringLiteral("ChkUseAccountKey")).value().toInt() == 1;
-    in.accountKey = surface.control(QStringLiteral("txtAccountKey")).text();
-    in.fromItem = surface.control(QStringLiteral("txtFromItem")).text();
-    in.toItem = surface.control(QStringLiteral("txtToItem")).text();
-    for (const LabelFieldSlot& slot : labelFieldSlots())
-        in.fieldChecks[size_t(slot.slot)] =
-            surface.control(QStringLiteral("ChkFldSend"), slot.slot).value().toInt() == 1;
-    in.companyName = surface.control(QStringLiteral("txtCompanyName")).text();
-    return in;
-}
-
-quint8 labelOrder(const Surface& surface) {
-    return surface.control(QStringLiteral("OptPrinter"), 1).value().toBool() ? Descending
-                                                                             : Ascending;
 }
 
 }  // namespace etq

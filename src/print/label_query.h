@@ -3,11 +3,9 @@
 #include <QString>
 #include <array>
 
-#include "print/label_fields.h"
+#include "platform/label_fields.h"
 
 namespace etq {
-
-class Surface;
 
 // What the label query selects: the marked items, or the included lines of the included
 // documents.
@@ -38,12 +36,5 @@ QString ItemKeyRangeCondition(const QString& fromItem, const QString& toItem);
 
 // The key as a text literal between apostrophes, an apostrophe inside doubled.
 QString quotedText(const QString& text);
-
-// The label query's settings as the label tab holds them now.
-LabelQueryInput labelQueryInput(const Surface& surface, quint8 queryType, quint8 order);
-
-// The order the printer type asks for: descending for "Thermal" (OptPrinter(1)), ascending
-// otherwise.
-quint8 labelOrder(const Surface& surface);
 
 }  // namespace etq

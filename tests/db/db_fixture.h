@@ -7,15 +7,22 @@
 
 #include <QFile>
 #include <QTemporaryDir>
+#include <optional>
 
 #include "db/file_names.h"
 #include "db/local_databases.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "jet/vb.h"
-#include "support/recording_messages.h"
+#include "platform/failure.h"
 
 namespace etq::db::test {
+
+// What a routine threw: the description and, for our own failures, their title.
+struct Failed {
+    QString description;
+    QString title;
+};
 
 // A database folder as a first run leaves it: the delivered document database, an item
 // database with its account tables, and a log database.
@@ -24,9 +31,9 @@ class DbFolderTest : public ::testing::Test {
     void SetUp() override {
         ASSERT_TRUE(QFile::copy(ETIQUON_DELIVERED_KDB, path(kDocDatabaseFile)));
         QFile::setPermissions(path(kDocDatabaseFile), QFile::ReadOwner | QFile::WriteOwner);
-        ASSERT_FALSE(CreateItemDatabase(path(kItemDatabaseFile)).isEmpty());
-        ASSERT_FALSE(AddAccountTables(path(kItemDatabaseFile)).isEmpty());
-        ASSERT_FALSE(CreateLogDatabase(path(kLogDatabaseFile)).isEmpty());
+        CreateItemDatabase(path(kItemDatabaseFile));
+        AddAccountTables(path(kItemDatabaseFile));
+        CreateLogDatabase(path(kLogDatabaseFile));
     }
 
     QString path(const QString& name) const { return inFolder(dir.path(), name); }
@@ -42,7 +49,18 @@ class DbFolderTest : public ::testing::Test {
     }
 
     QTemporaryDir dir;
-    etq::test::RecordingMessages messages;
 };
+
+// The failure `work` throws, or nothing when it runs to its end.
+template <class Work>
+std::optional<Failed> failureOf(Work&& work) {
+    try {
+        work();
+        return std::nullopt;
+    } catch (const std::exception& e) {
+        const auto* ours = dynamic_cast<const Failure*>(&e);
+        return Failed{describe(e), ours ? ours->title() : QString()};
+    }
+}
 
 }  // namespace etq::db::test

@@ -3,7 +3,9 @@
 
 #include "db/schemas.h"
 #include "db_fixture.h"
-#include "shell/captions.h"
+#include "platform/captions.h"
+#include "platform/context.h"
+#include "support/recording_progress.h"
 
 namespace etq::db::test {
 namespace {
@@ -36,36 +38,32 @@ TEST_F(LocalDatabasesTest, TheWorkingDatabaseLinksNineTablesOrTenWithTheLog) {
     ASSERT_EQ(work.links().size(), 10);
     EXPECT_EQ(work.links().last().name, "tStockLog");
     EXPECT_TRUE(rows(work, "SELECT * FROM tTempDocHeaders").isEmpty());
-    EXPECT_TRUE(messages.shown.isEmpty());
 }
 
-TEST_F(LocalDatabasesTest, AFailedCreationReportsAndReturnsEmptyText) {
+TEST_F(LocalDatabasesTest, AFailedCreationThrowsTheEngineDescription) {
     QFile::remove(path(kItemDatabaseFile));
-    EXPECT_TRUE(createWork(false).isEmpty());
-    ASSERT_EQ(messages.shown.size(), 1);
-    EXPECT_EQ(messages.shown[0].title, GetCaption(1));
-    EXPECT_EQ(messages.shown[0].icon, MsgIcon::Critical);
-    EXPECT_TRUE(messages.shown[0].text.contains(kItemDatabaseFile));
+    const auto failed = failureOf([&] { createWork(false); });
+    ASSERT_TRUE(failed);
+    EXPECT_TRUE(failed->description.contains(kItemDatabaseFile));
     // The half-built file stays; the next creation replaces it.
     EXPECT_TRUE(QFile::exists(path(kWorkDatabaseFile)));
-    ASSERT_FALSE(CreateItemDatabase(path(kItemDatabaseFile)).isEmpty());
-    ASSERT_FALSE(AddAccountTables(path(kItemDatabaseFile)).isEmpty());
+    CreateItemDatabase(path(kItemDatabaseFile));
+    AddAccountTables(path(kItemDatabaseFile));
     EXPECT_EQ(createWork(false), path(kWorkDatabaseFile));
 }
 
 TEST_F(LocalDatabasesTest, AddAccountTablesTwiceFailsTheSecondTime) {
-    EXPECT_TRUE(AddAccountTables(path(kItemDatabaseFile)).isEmpty());
-    ASSERT_EQ(messages.shown.size(), 1);
-    EXPECT_EQ(messages.shown[0].text, "Table 'tAccountDef' already exists.");
-    EXPECT_FALSE(UpgradeItemDatabase(dir.path()));
+    auto failed = failureOf([&] { AddAccountTables(path(kItemDatabaseFile)); });
+    ASSERT_TRUE(failed);
+    EXPECT_EQ(failed->description, "Table 'tAccountDef' already exists.");
+    EXPECT_TRUE(failureOf([&] { UpgradeItemDatabase(dir.path()); }));
 
-    messages.shown.clear();
-    EXPECT_TRUE(AddAccountTables(path("nothing.kdb")).isEmpty());
-    ASSERT_EQ(messages.shown.size(), 1);
-    EXPECT_EQ(messages.shown[0].text, "Database not found");
-    EXPECT_EQ(messages.shown[0].title, "Error");
+    failed = failureOf([&] { AddAccountTables(path("nothing.kdb")); });
+    ASSERT_TRUE(failed);
+    EXPECT_EQ(failed->description, "Database not found");
+    EXPECT_EQ(failed->title, "Error");
     QFile::remove(path(kItemDatabaseFile));
-    EXPECT_TRUE(UpgradeItemDatabase(dir.path()));  // nothing to upgrade
+    EXPECT_FALSE(failureOf([&] { UpgradeItemDatabase(dir.path()); }));  // nothing to upgrade
 }
 
 TEST_F(LocalDatabasesTest, MarkedItemsListFirstByKey) {
@@ -84,8 +82,7 @@ class MergeTest : public LocalDatabasesTest {
     void SetUp() override {
         LocalDatabasesTest::SetUp();
         ASSERT_EQ(CreateTempItemDatabase(path(kTempItemDatabaseFile), path(kItemDatabaseFile)),
-                  path(kTempItemDatabaseFile))
-            << messages.shown.value(0).text.toStdString();
+                  path(kTempItemDatabaseFile));
         jet::Database items = jet::Database::open(path(kItemDatabaseFile));
         items.execute("INSERT INTO tPriceList VALUES ('100', 1, 10, '¦'), ('100', 2, 20, '¦')");
         items.execute("INSERT INTO tAlterKeys VALUES ('C1', '100', 'A-1', 'BAR-1')");
@@ -136,13 +133,13 @@ TEST_F(MergeTest, CleanTablesFollowsItsTwoBoxes) {
             items.execute("INSERT INTO tItems (ItemKey) VALUES ('100')");
             items.execute("INSERT INTO tAlterPrices VALUES ('C1', '100', 5, '¦')");
         }
-        QStringList shown;
-        CleanItemTables(path(kItemDatabaseFile), c.clean, c.alterPrices,
-                        [&](const QString& m) { shown << m; });
+        etq::test::RecordingProgress progress;
+        CleanItemTables(path(kItemDatabaseFile), c.clean, c.alterPrices, Context(), progress);
+        const QStringList shown = progress.steps;
         EXPECT_EQ(itemRows("SELECT Count(*) FROM tItems"), QStringList{QString::number(c.items)});
         EXPECT_EQ(itemRows("SELECT Count(*) FROM tAlterPrices"),
                   QStringList{QString::number(c.alterPriceRows)});
-        EXPECT_EQ(shown, c.clean ? QStringList{GetCaption(42)} : QStringList());
+        EXPECT_EQ(shown, c.clean ? QStringList{GetCaption(42, 0)} : QStringList());
         // Alternate keys, account settings and price lists are never emptied here.
         EXPECT_EQ(itemRows("SELECT Count(*) FROM tAlterKeys"), QStringList{"1"});
         EXPECT_EQ(itemRows("SELECT Count(*) FROM tPriceList"), QStringList{"2"});

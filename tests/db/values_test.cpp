@@ -64,11 +64,9 @@ TEST(PublicFunctions, NullsTextsAndNumbers) {
 }
 
 TEST(PublicFunctions, LineBreaksBecomeTheAddressSeparator) {
-    setAddressSeparator(",");
-    EXPECT_EQ(ReplaceLineBreaks(QString("a\rb\rc")), "a,b,c");
-    setAddressSeparator("\r\n");
-    EXPECT_EQ(ReplaceLineBreaks(QString("a\rb")), "a\r\nb");
-    EXPECT_EQ(ReplaceLineBreaks(QVariant()), "");
+    EXPECT_EQ(ReplaceLineBreaks(QString("a\rb\rc"), ","), "a,b,c");
+    EXPECT_EQ(ReplaceLineBreaks(QString("a\rb"), "\r\n"), "a\r\nb");
+    EXPECT_EQ(ReplaceLineBreaks(QVariant(), ","), "");
 }
 
 }  // namespace

@@ -4,7 +4,7 @@
 #include "db/db_fixture.h"
 #include "dialogs/items_query.h"
 #include "print/label_query.h"
-#include "shell/bound_grid_model.h"
+#include "dialogs/bound_grid_model.h"
 
 namespace etq::dialogs::test {
 namespace {

@@ -9,10 +9,10 @@
 #include <QTimer>
 
 #include "db/db_fixture.h"
-#include "shell/bound_grid_model.h"
-#include "shell/captions.h"
-#include "shell/card_controller.h"
-#include "shell/main_card.h"
+#include "dialogs/bound_grid_model.h"
+#include "platform/captions.h"
+#include "card/card_controller.h"
+#include "card/main_card.h"
 
 namespace etq::dialogs::test {
 namespace {

@@ -11,12 +11,12 @@
 #include "db/file_names.h"
 #include "db/local_databases.h"
 #include "import/connection.h"
-#include "import/progress_bar.h"
+#include "surface/surface_progress.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "jet/vb.h"
 #include "samples/host_records.h"
-#include "shell/memory_surface.h"
+#include "surface/memory_surface.h"
 #include "support/recording_messages.h"
 
 namespace etq::test {

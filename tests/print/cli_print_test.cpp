@@ -33,7 +33,7 @@ class CliPrintTest : public ::testing::Test {
                 0);
     }
     QString db() const { return dir.path() + "/db"; }
-    static ProcessResult cli(const QStringList& args) { return runProcess(ETIQUON_CLI_PATH, args); }
+    static ProcessResult cli(const QStringList& args) { return runProcess(ETIQUON_CLI, args); }
     static ProcessResult cli5(const QStringList& args) {
         return cli(QStringList{"--setting-id", "5"} + args);
     }

@@ -5,8 +5,8 @@
 #include <QFileInfo>
 
 #include "print_fixture.h"
-#include "shell/card_controller.h"
-#include "shell/component.h"
+#include "card/card_controller.h"
+#include "card/component.h"
 
 namespace etq::print::test {
 namespace {

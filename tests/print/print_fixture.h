@@ -7,7 +7,7 @@
 #include "platform/browser.h"
 #include "platform/settings_store.h"
 #include "print/label_definition.h"
-#include "shell/memory_surface.h"
+#include "surface/memory_surface.h"
 
 namespace etq::print::test {
 

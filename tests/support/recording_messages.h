@@ -6,14 +6,11 @@
 
 namespace etq::test {
 
-// Keeps every message instead of showing it, and answers questions with a chosen answer.
-// Installed for its lifetime.
+// Keeps every message instead of showing it, and answers questions with a chosen answer. A test
+// gives it to its context.
 class RecordingMessages : public MessageSink {
   public:
-    explicit RecordingMessages(MsgAnswer answer = MsgAnswer::Yes) : answer_(answer) {
-        setMessageSink(this);
-    }
-    ~RecordingMessages() override { setMessageSink(nullptr); }
+    explicit RecordingMessages(MsgAnswer answer = MsgAnswer::Yes) : answer_(answer) {}
 
     MsgAnswer show(const Message& message) override {
         shown.append(message);

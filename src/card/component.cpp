@@ -1,0 +1,34 @@
+#include "card/component.h"
+
+#include "card/boundary.h"
+#include "card/card_controller.h"
+#include "card/import_adapters.h"
+#include "card/print_adapters.h"
+#include "db/local_databases.h"
+#include "platform/context.h"
+#include "print/label_definition.h"
+
+namespace etq {
+
+void connectParts(CardController& controller, Surface& surface) {
+    Context& context = controller.context();
+    CardHooks& hooks = controller.hooks();
+    hooks.upgradeItemDatabase = [&context](const QString& itemDatabase) {
+        QString upgraded;
+        reportFailures(context, context.caption(1),
+                       [&] { upgraded = db::AddAccountTables(itemDatabase); });
+        return upgraded;
+    };
+    hooks.fillCmbPrice = [](const Surface& s, Context& c) { FillCmbPrice(s, c); };
+    hooks.fillCmbItmQGrp = [](const Surface& s, Context& c) { FillCmbItmQGrp(s, c); };
+    hooks.fillCmbItmBelong = [](const Surface& s, Context& c) { FillCmbItmBelong(s, c); };
+    hooks.labelDefinition = [&context](quint8 action) {
+        GetSetLabelDef(action, context.applicationName, context.labelDefinition());
+    };
+    controller.setWork(QStringLiteral("CmdImportItems"),
+                       [&surface, &context](int) { CmdImportItems(surface, context); });
+    controller.setWork(QStringLiteral("cmdPrintItmes"),
+                       [&surface, &context](int) { PrintItemLabels(surface, context); });
+}
+
+}  // namespace etq

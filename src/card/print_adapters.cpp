@@ -1,0 +1,125 @@
+#include "card/print_adapters.h"
+
+#include "card/boundary.h"
+#include "platform/browser.h"
+#include "platform/context.h"
+#include "platform/label_fields.h"
+#include "platform/messages.h"
+#include "surface/control_values.h"
+#include "surface/surface.h"
+#include "surface/surface_progress.h"
+
+namespace etq {
+
+namespace {
+
+// The built-in page has always titled its messages in Hebrew, whatever the language.
+const QString kPageFailureTitle = QStringLiteral("תקלה");
+
+void tellRefusedBarcodes(Context& context, const QStringList& refused) {
+    constexpr int kShown = 10;
+    QString text = QStringLiteral("%1 labels have no barcode:").arg(refused.size());
+    for (int i = 0; i < refused.size() && i < kShown; ++i)
+        text += u'\n' + refused[i];
+    if (refused.size() > kShown)
+        text += QStringLiteral("\n... and %1 more").arg(refused.size() - kShown);
+    context.messages().show({text, kPageFailureTitle, MsgIcon::Exclamation, MsgButtons::Ok});
+}
+
+LabelPageInput readLabelPageInput(const ControlValues& values, quint8 queryType) {
+    return {readLabelQueryInput(values, queryType, labelOrder(values)),
+            values.text(QStringLiteral("txtPriceFormat"))};
+}
+
+}  // namespace
+
+qint16 GetLabelSoftwareKind(const ControlValues& values) {
+    constexpr qint16 kKindOfOption[] = {kNiceLabel, kCodeSoft, kBarTender, kBuiltInPage,
+                                        kFastLabel};
+    for (int option = 0; option < int(std::size(kKindOfOption)); ++option)
+        if (values.value(QStringLiteral("OptOLE"), option) == 1) return kKindOfOption[option];
+    return kNoLabelSoftware;
+}
+
+qint16 GetLabelSoftwareKind(const Surface& surface) {
+    return GetLabelSoftwareKind(SurfaceValues(surface));
+}
+
+quint8 labelOrder(const ControlValues& values) {
+    return values.value(QStringLiteral("OptPrinter"), 1) == 1 ? Descending : Ascending;
+}
+
+LabelQueryInput readLabelQueryInput(const ControlValues& values, quint8 queryType, quint8 order) {
+    LabelQueryInput in;
+    in.queryType = queryType;
+    in.order = order;
+    in.useAccountKey = values.isChecked(QStringLiteral("ChkUseAccountKey"));
+    in.accountKey = values.text(QStringLiteral("txtAccountKey"));
+    in.fromItem = values.text(QStringLiteral("txtFromItem"));
+    in.toItem = values.text(QStringLiteral("txtToItem"));
+    for (const LabelFieldSlot& slot : labelFieldSlots())
+        in.fieldChecks[size_t(slot.slot)] = values.isChecked(QStringLiteral("ChkFldSend"), slot.slot);
+    in.companyName = values.text(QStringLiteral("txtCompanyName"));
+    return in;
+}
+
+ItemPrintOptions readItemPrintOptions(const ControlValues& values) {
+    ItemPrintOptions options;
+    options.databaseFolder = values.text(QStringLiteral("txtDBPath"));
+    options.kind = GetLabelSoftwareKind(values);
+    if (values.listIndex(QStringLiteral("cmbPrinter")) >= 0)
+        options.printer = values.text(QStringLiteral("cmbPrinter"));
+    options.page = readLabelPageInput(values, ItemLabels);
+    return options;
+}
+
+void showFieldChecks(const Surface& surface, const LabelQueryInput& query) {
+    for (const LabelFieldSlot& slot : labelFieldSlots()) {
+        const ControlRef box = surface.control(QStringLiteral("ChkFldSend"), slot.slot);
+        if (query.fieldChecks[size_t(slot.slot)] && box.value().toInt() != 1) box.setValue(1);
+    }
+}
+
+QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& dbName,
+                           quint8 queryType) {
+    SurfaceProgress progress(surface);
+    LabelPageInput input = readLabelPageInput(SurfaceValues(surface), queryType);
+    BuiltInPrint print;
+    const bool printed = reportFailures(context, kPageFailureTitle, [&] {
+        print = printBuiltInLabels(dbName, input, context.labelDefinition(), progress);
+    });
+    showFieldChecks(surface, input.query);
+    if (!printed) return {};
+    QString error;
+    if (!context.pages().showPage(print.pagePath, &error))
+        showCritical(context.messages(), error, kPageFailureTitle);
+    if (!print.refusedBarcodes.isEmpty()) tellRefusedBarcodes(context, print.refusedBarcodes);
+    return print.pagePath;
+}
+
+QString PrintItemLabels(Surface& surface, Context& context) {
+    QString workDb;
+    if (!reportFailures(context, context.caption(1), [&] {
+            workDb = prepareItemPrint(readItemPrintOptions(SurfaceValues(surface)));
+        }))
+        return {};
+    return PrintBuiltInLabels(surface, context, workDb, ItemLabels);
+}
+
+void CreateLabFile(Surface& surface, Context& context, const QString& fileName,
+                   const QString& dbName, quint8 queryType, quint8 orderBy) {
+    SurfaceProgress progress(surface);
+    const SurfaceValues values(surface);
+    LabelPageInput input{readLabelQueryInput(values, queryType, orderBy),
+                         values.text(QStringLiteral("txtPriceFormat"))};
+    // The boxes of the cells' fields are ticked also when the page fails after ticking them.
+    try {
+        writeLabelPage(fileName, dbName, input, context.labelDefinition(), progress);
+    } catch (...) {
+        showFieldChecks(surface, input.query);
+        throw;
+    }
+    showFieldChecks(surface, input.query);
+}
+
+}  // namespace etq

@@ -1,0 +1,77 @@
+#include "print/label_software.h"
+
+#include <QStringList>
+
+#include "platform/file_chooser.h"
+
+namespace etq {
+
+namespace {
+
+struct KindFilters {
+    qint16 kind;
+    QStringView labelFiles;
+    QStringView software;
+};
+
+constexpr KindFilters kFilters[] = {
+    {kCodeSoft, u"All Files (*.*)|*.*|CodeSoft Files (*.lab)|*.lab",
+     u"All Software (*.exe)|*.exe|CodeSoft Software|Lppa.exe"},
+    {kBarTender, u"All Files (*.*)|*.*|BarTender Files (*.btw)|*.btw",
+     u"All Software (*.exe)|*.exe|BarTender Software|Bartend.exe"},
+    {kNiceLabel, u"All Files (*.*)|*.*|NiceLabel Files (*.lbl)|*.lbl",
+     u"All Software (*.exe)|*.exe|NiceLabel Software|Nice3.exe"},
+    {kFastLabel, u"All Files (*.*)|*.*|FastLabel Files (*.lbl)|*.lbl",
+     u"All Software (*.exe)|*.exe|FastLabel Software|fastlbl.exe"},
+};
+
+const KindFilters* filtersOf(qint16 kind) {
+    for (const KindFilters& f : kFilters)
+        if (f.kind == kind) return &f;
+    return nullptr;
+}
+
+// The dialogs preselect the kind's own files, the second filter.
+constexpr int kPreselectedFilter = 2;
+
+QString choose(const QString& filter, FileChooser& chooser) {
+    return chooser.chooseFile(toQtFilter(filter), kPreselectedFilter);
+}
+
+}  // namespace
+
+QString labelFileFilter(qint16 kind) {
+    const KindFilters* f = filtersOf(kind);
+    return f ? f->labelFiles.toString() : QString();
+}
+
+QString labelSoftwareFilter(qint16 kind) {
+    const KindFilters* f = filtersOf(kind);
+    return f ? f->software.toString() : QString();
+}
+
+QString toQtFilter(const QString& filter) {
+    const QStringList parts = filter.split(u'|');
+    QStringList filters;
+    for (qsizetype i = 0; i + 1 < parts.size(); i += 2) {
+        QString name = parts[i].trimmed();
+        // The name may show its patterns already; Qt reads them from the parentheses.
+        const qsizetype open = name.lastIndexOf(u'(');
+        if (open > 0 && name.endsWith(u')')) name = name.left(open).trimmed();
+        QStringList patterns = parts[i + 1].split(u';', Qt::SkipEmptyParts);
+        for (QString& p : patterns)
+            if (p.trimmed() == u"*.*") p = QStringLiteral("*");
+        filters.append(QStringLiteral("%1 (%2)").arg(name, patterns.join(u' ')));
+    }
+    return filters.join(QStringLiteral(";;"));
+}
+
+QString SelectLabelFile(qint16 kind, FileChooser& chooser) {
+    return choose(labelFileFilter(kind), chooser);
+}
+
+QString SelectLabelSoftware(qint16 kind, FileChooser& chooser) {
+    return choose(labelSoftwareFilter(kind), chooser);
+}
+
+}  // namespace etq

@@ -1,0 +1,30 @@
+#pragma once
+
+#include <QString>
+
+namespace etq {
+
+class FileChooser;
+
+// The label software kinds, as the option array OptOLE chooses them.
+inline constexpr qint16 kNoLabelSoftware = 0;
+inline constexpr qint16 kCodeSoft = 2;
+inline constexpr qint16 kBarTender = 4;
+inline constexpr qint16 kNiceLabel = 5;
+inline constexpr qint16 kBuiltInPage = 6;
+inline constexpr qint16 kFastLabel = 7;
+
+// The file filters of a kind, as the component writes them ("Name|pattern|Name|pattern"):
+// for its label design files and for its program. Kinds without label software have none.
+QString labelFileFilter(qint16 kind);
+QString labelSoftwareFilter(qint16 kind);
+
+// "All Files (*.*)|*.*|CodeSoft Files (*.lab)|*.lab" -> "All Files (*);;CodeSoft Files (*.lab)".
+QString toQtFilter(const QString& filter);
+
+// Open-file dialogs for a label design file and for the label software's program, with the
+// kind's filters and the second filter preselected. Empty text when cancelled.
+QString SelectLabelFile(qint16 kind, FileChooser& chooser);
+QString SelectLabelSoftware(qint16 kind, FileChooser& chooser);
+
+}  // namespace etq

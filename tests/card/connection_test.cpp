@@ -1,0 +1,98 @@
+// The connection parameters, their texts and the connection dialog.
+#include <gtest/gtest.h>
+
+#include <QLabel>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QTemporaryDir>
+
+#include "import/connection.h"
+#include "dialogs/logon_dialog.h"
+#include "platform/settings_store.h"
+#include "card_test_support.h"
+
+namespace etq {
+namespace {
+
+class ConnectionTest : public ::testing::Test {
+  protected:
+    void SetUp() override { test::resetSettings(); }
+};
+
+TEST_F(ConnectionTest, ConnectionTextsByForm) {
+    EXPECT_EQ(BuildConnString("srv", "sa", "pw", "corvan02", 1),
+              "driver={SQL Server};server=srv;uid=sa;pwd=pw;database=corvan02");
+    EXPECT_EQ(BuildConnString("srv", "sa", "pw", "corvan02", 2),
+              "Provider=sqloledb;Data Source=srv;User Id=sa;Password=pw;Initial Catalog=corvan02");
+    EXPECT_EQ(BuildConnString("srv", "sa", QString(), "db", 2),
+              "Provider=sqloledb;Data Source=srv;User Id=sa;Password=;Initial Catalog=db");
+    EXPECT_EQ(BuildConnString("srv", "sa", "%1", "db", 1),
+              "driver={SQL Server};server=srv;uid=sa;pwd=%1;database=db");
+    EXPECT_EQ(BuildConnString("srv", "sa", "pw", "db", 0), "");
+    EXPECT_EQ(BuildConnString("srv", "sa", "pw", "db", 4), "");
+}
+
+TEST_F(ConnectionTest, TheCompanyFolderHasOneSeparator) {
+    for (const char* server : {"/srv/menahel", "/srv/menahel/", "/srv/menahel\\"})
+        EXPECT_EQ(BuildConnString(server, "sa", "", "corvan02", 3), "/srv/menahel/corvan02")
+            << server;
+}
+
+TEST_F(ConnectionTest, ParametersComeFromTheStoreOrTheirDefaults) {
+    GetConnParams();
+    EXPECT_EQ(connParams().server, "server");
+    EXPECT_EQ(connParams().user, "sa");
+    EXPECT_EQ(connParams().password, "");
+    EXPECT_EQ(connParams().database, "corvan02");
+
+    setApplicationName("Etiquon3");
+    SettingsStore store("Etiquon3");
+    store.write("Params", "ConnServer", "/srv/host");
+    store.write("Params", "ConnUID", "reader");
+    store.write("Params", "ConnPWD", "סוד");
+    store.sync();
+    GetConnParams();
+    EXPECT_EQ(connParams().server, "/srv/host");
+    EXPECT_EQ(connParams().user, "reader");
+    EXPECT_EQ(connParams().password, "סוד");
+    EXPECT_EQ(connParams().database, "corvan02");
+    EXPECT_EQ(companyFolder(), "/srv/host/corvan02");
+}
+
+TEST_F(ConnectionTest, TheDialogChecksForTheAccountsFileAndSavesOnAccept) {
+    QTemporaryDir host;
+    QDir(host.path()).mkpath("demo");
+    test::writeEmptyDbf(host.filePath("demo/oitm.dbf"), "ITEMCODE", 13);
+    connParams().server = host.path();
+    connParams().database = "demo";
+
+    LogonDialog dialog;
+    auto* server = dialog.findChild<QLineEdit*>("txtConnServer");
+    auto* database = dialog.findChild<QLineEdit*>("txtConnDatabase");
+    auto* message = dialog.findChild<QLabel*>("LblMsg");
+    auto* check = dialog.findChild<QPushButton*>("CmdCheck");
+    ASSERT_TRUE(server && database && message && check);
+    EXPECT_EQ(server->text(), host.path());
+    EXPECT_EQ(database->text(), "demo");
+
+    check->click();  // the items file alone is not enough
+    EXPECT_EQ(message->text(), "הבדיקה לא הסתיימה בהצלחה");
+    test::writeEmptyDbf(host.filePath("demo/ocrd.dbf"), "CARDCODE", 15);
+    server->setText(host.path() + "/");
+    check->click();
+    EXPECT_EQ(message->text(), "הבדיקה הסתיימה בהצלחה");
+
+    dialog.findChild<QPushButton*>("cmdCancel")->click();
+    EXPECT_FALSE(SettingsStore("Etiquon").contains("Params", "ConnServer"));
+    EXPECT_EQ(connParams().server, host.path());
+
+    dialog.findChild<QPushButton*>("cmdOK")->click();
+    EXPECT_EQ(dialog.result(), QDialog::Accepted);
+    EXPECT_EQ(connParams().server, host.path() + "/");
+    EXPECT_EQ(readSetting("Etiquon", "Params", "ConnServer", ""), host.path() + "/");
+    EXPECT_EQ(readSetting("Etiquon", "Params", "ConnDataBase", ""), "demo");
+    EXPECT_FALSE(SettingsStore("Etiquon").contains("Params", "ConnUID"));
+}
+
+}  // namespace
+}  // namespace etq
