@@ -122,7 +122,6 @@ bool ReadItemMNHL(const Surface& surface, Context& context, const QString& compP
                   bool importPriceLists) {
     SurfaceProgress progress(surface);
     return reportFailures(context, context.caption(1), [&] {
-        progress.clear();
         ItemReadOptions options = readItemSelection(SurfaceValues(surface));
         options.companyFolder = compPath;
         options.databasePath = dbPath;

@@ -10,7 +10,9 @@
 #include "platform/settings_store.h"
 #include "platform/captions.h"
 #include "card/card_controller.h"
-#include "card/label_software.h"
+#include "card/print_adapters.h"
+#include "platform/context.h"
+#include "print/label_software.h"
 #include "surface/memory_surface.h"
 #include "surface/settings_groups.h"
 #include "card_test_support.h"
@@ -48,27 +50,28 @@ class CardTest : public ::testing::Test {
     }
 
     MemorySurface surface;
-    CardController card{surface};
+    Context context;
+    CardController card{surface, context};
     QList<QStringList> started;
     QTemporaryDir dir;
 };
 
 TEST_F(CardTest, StartUpWithTheDefaultCompanyLeavesTheHostListsAlone) {
     QStringList calls;
-    card.hooks().fillCmbPrice = [&](const Surface&) { calls << "price"; };
+    card.hooks().fillCmbPrice = [&](const Surface&, Context&) { calls << "price"; };
     card.hooks().labelDefinition = [&](quint8 action) { calls << QString("label%1").arg(action); };
     card.InitProperties();
 
-    EXPECT_EQ(applicationName(), "Etiquon");
+    EXPECT_EQ(context.applicationName, "Etiquon");
     EXPECT_EQ(calls, QStringList{"label2"});  // the built-in label is the default route
     EXPECT_EQ(c("MainTab").currentTab(), 0);
     EXPECT_EQ(c("cmbPriceField").listIndex(), -1);
-    EXPECT_EQ(connParams().server, "server");
-    EXPECT_EQ(connParams().user, "sa");
+    EXPECT_EQ(context.connection.server, "server");
+    EXPECT_EQ(context.connection.user, "sa");
 }
 
 TEST_F(CardTest, StartUpFillsTheHostListsBeforeLoadingTheSettings) {
-    setApplicationName("Etiquon3");
+    context.applicationName = "Etiquon3";
     SettingsStore store("Etiquon3");
     store.write("Params", "ConnDataBase", "demo");
     store.write("Params", "ConnServer", "/srv/host");
@@ -82,7 +85,7 @@ TEST_F(CardTest, StartUpFillsTheHostListsBeforeLoadingTheSettings) {
 
     QStringList calls;
     auto fill = [&](const char* name, const char* combo, int entries) {
-        return [&calls, name, combo, entries](const Surface& s) {
+        return [&calls, name, combo, entries](const Surface& s, Context&) {
             calls << name;
             for (int i = 0; i < entries; ++i)
                 s.control(combo).addItem(QString::number(i), i + 10);
@@ -98,9 +101,9 @@ TEST_F(CardTest, StartUpFillsTheHostListsBeforeLoadingTheSettings) {
     card.InitProperties("3");
 
     EXPECT_EQ(calls, (QStringList{"price", "group", "belong"}));  // no label: route CodeSoft
-    EXPECT_EQ(connParams().database, "demo");
-    EXPECT_EQ(connParams().server, "/srv/host");
-    EXPECT_EQ(companyFolder(), "/srv/host/demo");
+    EXPECT_EQ(context.connection.database, "demo");
+    EXPECT_EQ(context.connection.server, "/srv/host");
+    EXPECT_EQ(companyFolder(context.connection), "/srv/host/demo");
     EXPECT_EQ(c("cmbPriceField").selectedItemData(), 12);
     EXPECT_EQ(c("cmbItmBelong").listIndex(), 1);
     EXPECT_EQ(c("cmbPrinter").listCount(), 2);
@@ -115,7 +118,7 @@ TEST_F(CardTest, StartUpPassesOverAFailingStep) {
     };
     writeSetting("Etiquon", "LabelByItems", "FromItem", "A100");
     card.InitProperties(" 7 ");
-    EXPECT_EQ(applicationName(), "Etiquon7");
+    EXPECT_EQ(context.applicationName, "Etiquon7");
     EXPECT_EQ(c("txtFromItem").text(), "");  // Etiquon7 has its own settings
     EXPECT_EQ(c("txtCopies").text(), "1");
 }
@@ -123,7 +126,7 @@ TEST_F(CardTest, StartUpPassesOverAFailingStep) {
 TEST_F(CardTest, TheLanguageSettingSelectsEnglish) {
     writeSetting("Etiquon", "Params", "Language", "1");
     card.InitProperties();
-    EXPECT_EQ(GetCaption(1), "Error");
+    EXPECT_EQ(context.caption(1), "Error");
     // The surface itself keeps its Hebrew design.
     EXPECT_EQ(c("cmdSaveDef1").caption(), "שמור הגדרות");
 }
@@ -140,7 +143,7 @@ TEST_F(CardTest, FromDocNumCarriesToDocNumUntilToDocNumIsEdited) {
     // Loading the group sets FromDocNum first, then the stored ToDocNum.
     writeSetting("Etiquon", "LabelByDocs", "FromDocNum", "100");
     writeSetting("Etiquon", "LabelByDocs", "ToDocNum", "250");
-    GetSetParams(surface, 5, LoadSettings);
+    GetSetParams(surface, context.applicationName, 5, LoadSettings);
     EXPECT_EQ(c("txtFromDocNum").text(), "100");
     EXPECT_EQ(c("txtToDocNum").text(), "250");
 }
@@ -223,24 +226,27 @@ TEST_F(CardTest, OpeningTheLabelSoftwareNeedsTheProgram) {
 
     {
         test::RecordingMessages sink;
+        context.setMessages(&sink);
         card.click("ImgEdit", 1);
         ASSERT_EQ(sink.shown.size(), 1u);
-        EXPECT_EQ(sink.shown[0].text, GetCaption(39));
-        EXPECT_EQ(sink.shown[0].title, GetCaption(30));
+        EXPECT_EQ(sink.shown[0].text, context.caption(39));
+        EXPECT_EQ(sink.shown[0].title, context.caption(30));
         EXPECT_EQ(sink.shown[0].icon, MsgIcon::Critical);
         EXPECT_TRUE(started.isEmpty());
     }
     touch(program);
     {
         test::RecordingMessages sink(MsgAnswer::No);
+        context.setMessages(&sink);
         card.click("ImgEdit", 1);
         ASSERT_EQ(sink.shown.size(), 1u);
-        EXPECT_EQ(sink.shown[0].text, GetCaption(40));
+        EXPECT_EQ(sink.shown[0].text, context.caption(40));
         EXPECT_EQ(sink.shown[0].buttons, MsgButtons::YesNo);
         EXPECT_TRUE(started.isEmpty());
     }
     {
         test::RecordingMessages sink(MsgAnswer::Yes);
+        context.setMessages(&sink);
         card.click("ImgEdit", 1);
         ASSERT_EQ(started.size(), 1);
         EXPECT_EQ(started[0], QStringList{program});
@@ -249,6 +255,7 @@ TEST_F(CardTest, OpeningTheLabelSoftwareNeedsTheProgram) {
     touch(head);
     {
         test::RecordingMessages sink;
+        context.setMessages(&sink);
         card.click("ImgEdit", 1);
         card.click("ImgEdit", 0);
         EXPECT_TRUE(sink.shown.empty());

@@ -54,8 +54,8 @@ TEST_F(CliConfigTest, SetThenGetRoundTripsAndTheControlLoadsIt) {
     EXPECT_EQ(cli({"get", "0LabelDef", "UseCell"}).out, "-1\n");
 
     MemorySurface surface;
-    GetSetParams(surface, 1, LoadSettings);
-    GetSetParams(surface, 3, LoadSettings);
+    GetSetParams(surface, "Etiquon", 1, LoadSettings);
+    GetSetParams(surface, "Etiquon", 3, LoadSettings);
     EXPECT_EQ(surface.control("txtCompanyName").text(), "חנות הדוגמה");
     EXPECT_EQ(surface.control("ChkFldSend", 5).value().toInt(), 1);
 

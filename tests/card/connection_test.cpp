@@ -6,8 +6,9 @@
 #include <QPushButton>
 #include <QTemporaryDir>
 
-#include "import/connection.h"
 #include "dialogs/logon_dialog.h"
+#include "import/connection.h"
+#include "platform/context.h"
 #include "platform/settings_store.h"
 #include "card_test_support.h"
 
@@ -17,6 +18,7 @@ namespace {
 class ConnectionTest : public ::testing::Test {
   protected:
     void SetUp() override { test::resetSettings(); }
+    Context context;
 };
 
 TEST_F(ConnectionTest, ConnectionTextsByForm) {
@@ -39,34 +41,34 @@ TEST_F(ConnectionTest, TheCompanyFolderHasOneSeparator) {
 }
 
 TEST_F(ConnectionTest, ParametersComeFromTheStoreOrTheirDefaults) {
-    GetConnParams();
-    EXPECT_EQ(connParams().server, "server");
-    EXPECT_EQ(connParams().user, "sa");
-    EXPECT_EQ(connParams().password, "");
-    EXPECT_EQ(connParams().database, "corvan02");
+    GetConnParams(context);
+    EXPECT_EQ(context.connection.server, "server");
+    EXPECT_EQ(context.connection.user, "sa");
+    EXPECT_EQ(context.connection.password, "");
+    EXPECT_EQ(context.connection.database, "corvan02");
 
-    setApplicationName("Etiquon3");
+    context.applicationName = "Etiquon3";
     SettingsStore store("Etiquon3");
     store.write("Params", "ConnServer", "/srv/host");
     store.write("Params", "ConnUID", "reader");
     store.write("Params", "ConnPWD", "סוד");
     store.sync();
-    GetConnParams();
-    EXPECT_EQ(connParams().server, "/srv/host");
-    EXPECT_EQ(connParams().user, "reader");
-    EXPECT_EQ(connParams().password, "סוד");
-    EXPECT_EQ(connParams().database, "corvan02");
-    EXPECT_EQ(companyFolder(), "/srv/host/corvan02");
+    GetConnParams(context);
+    EXPECT_EQ(context.connection.server, "/srv/host");
+    EXPECT_EQ(context.connection.user, "reader");
+    EXPECT_EQ(context.connection.password, "סוד");
+    EXPECT_EQ(context.connection.database, "corvan02");
+    EXPECT_EQ(companyFolder(context.connection), "/srv/host/corvan02");
 }
 
 TEST_F(ConnectionTest, TheDialogChecksForTheAccountsFileAndSavesOnAccept) {
     QTemporaryDir host;
     QDir(host.path()).mkpath("demo");
     test::writeEmptyDbf(host.filePath("demo/oitm.dbf"), "ITEMCODE", 13);
-    connParams().server = host.path();
-    connParams().database = "demo";
+    context.connection.server = host.path();
+    context.connection.database = "demo";
 
-    LogonDialog dialog;
+    LogonDialog dialog(context);
     auto* server = dialog.findChild<QLineEdit*>("txtConnServer");
     auto* database = dialog.findChild<QLineEdit*>("txtConnDatabase");
     auto* message = dialog.findChild<QLabel*>("LblMsg");
@@ -84,11 +86,11 @@ TEST_F(ConnectionTest, TheDialogChecksForTheAccountsFileAndSavesOnAccept) {
 
     dialog.findChild<QPushButton*>("cmdCancel")->click();
     EXPECT_FALSE(SettingsStore("Etiquon").contains("Params", "ConnServer"));
-    EXPECT_EQ(connParams().server, host.path());
+    EXPECT_EQ(context.connection.server, host.path());
 
     dialog.findChild<QPushButton*>("cmdOK")->click();
     EXPECT_EQ(dialog.result(), QDialog::Accepted);
-    EXPECT_EQ(connParams().server, host.path() + "/");
+    EXPECT_EQ(context.connection.server, host.path() + "/");
     EXPECT_EQ(readSetting("Etiquon", "Params", "ConnServer", ""), host.path() + "/");
     EXPECT_EQ(readSetting("Etiquon", "Params", "ConnDataBase", ""), "demo");
     EXPECT_FALSE(SettingsStore("Etiquon").contains("Params", "ConnUID"));

@@ -16,6 +16,7 @@
 #include "dialogs/bound_grid_model.h"
 #include "platform/captions.h"
 #include "card/main_card.h"
+#include "platform/context.h"
 #include "card_test_support.h"
 #include "support/qt_print.h"
 
@@ -42,6 +43,7 @@ class DataGridTest : public ::testing::Test {
     QTemporaryDir dir;
     QString docDb;
     test::RecordingMessages sink;
+    Context context;
 };
 
 TEST_F(DataGridTest, TicksInABoundGridReachTheTable) {
@@ -71,16 +73,17 @@ TEST_F(DataGridTest, TicksInABoundGridReachTheTable) {
 }
 
 TEST_F(DataGridTest, TabSixShowsTheDocumentTypesAndItsButtonsTickThemAll) {
-    MainCard card;
+    context.setMessages(&sink);
+    MainCard card(context);
     card.control("txtDBPath").setText(dir.path());
     card.mainTab()->setCurrentIndex(6);
     auto* view = card.findChild<QTableView*>("VSDocTypes");
     ASSERT_TRUE(view && view->model());
     const QAbstractItemModel* model = view->model();
     ASSERT_EQ(model->rowCount(), 7);
-    EXPECT_EQ(model->headerData(0, Qt::Horizontal, Qt::DisplayRole).toString(), GetCaption(7));
-    EXPECT_EQ(model->headerData(1, Qt::Horizontal, Qt::DisplayRole).toString(), GetCaption(27));
-    EXPECT_EQ(model->headerData(2, Qt::Horizontal, Qt::DisplayRole).toString(), GetCaption(28));
+    EXPECT_EQ(model->headerData(0, Qt::Horizontal, Qt::DisplayRole).toString(), GetCaption(7, 0));
+    EXPECT_EQ(model->headerData(1, Qt::Horizontal, Qt::DisplayRole).toString(), GetCaption(27, 0));
+    EXPECT_EQ(model->headerData(2, Qt::Horizontal, Qt::DisplayRole).toString(), GetCaption(28, 0));
     card.findChild<QPushButton*>("cmdAllDocTypes")->click();
     EXPECT_EQ(scanFlags(), QStringList(7, "1"));
     card.findChild<QPushButton*>("cmdNoDocTypes")->click();
@@ -89,8 +92,9 @@ TEST_F(DataGridTest, TabSixShowsTheDocumentTypesAndItsButtonsTickThemAll) {
 
 TEST_F(DataGridTest, TheUpgradeButtonAddsTheAccountTablesOnce) {
     const QString itemDb = db::inFolder(dir.path(), db::kItemDatabaseFile);
-    ASSERT_FALSE(db::CreateItemDatabase(itemDb).isEmpty());  // a file of the older release
-    MainCard card;
+    db::CreateItemDatabase(itemDb);  // a file of the older release
+    context.setMessages(&sink);
+    MainCard card(context);
     card.control("txtDBPath").setText(dir.path());
     card.findChild<QPushButton*>("cmdUpgrade")->click();
     EXPECT_EQ(card.control("Message1").caption(), "Upgrade successfull");

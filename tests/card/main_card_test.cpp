@@ -14,7 +14,8 @@
 #include <QTest>
 
 #include "card/card_controller.h"
-#include "card/label_software.h"
+#include "card/print_adapters.h"
+#include "platform/context.h"
 #include "dialogs/language_switch.h"
 #include "card/main_card.h"
 #include "surface/memory_surface.h"
@@ -74,7 +75,8 @@ class MainCardTest : public ::testing::Test {
         return w;
     }
 
-    MainCard card;
+    Context context;
+    MainCard card{context};
 };
 
 TEST_F(MainCardTest, EveryControlIsOnItsTabInBothSurfaces) {

@@ -26,7 +26,7 @@ class HostListsTest : public ImportTest {
 
 TEST_F(HostListsTest, CombosTakeNamedRecordsWithTheirNumbers) {
     surface.control("cmbItmBelong").addItem("old", 99);
-    FillCmbItmBelong(surface);  // no oitb.dbf: the combo keeps its entries
+    FillCmbItmBelong(surface, context);  // no oitb.dbf: the combo keeps its entries
     EXPECT_EQ(entries("cmbItmBelong"), QStringList{"old=99"});
 
     ItemGroupRecord deleted{3, "gone"};
@@ -35,9 +35,9 @@ TEST_F(HostListsTest, CombosTakeNamedRecordsWithTheirNumbers) {
           QList<ItemGroupRecord>{{1, QStringLiteral("מוצרי חלב")}, {2, "  "}, deleted, {14, "x"}});
     write("oitg.dbf", QList<demo::PropertyGroupRecord>{{8, "kosher"}});
     write("opln.dbf", QList<demo::PriceListRecord>{{1, "base"}, {10, "vip"}});
-    FillCmbItmBelong(surface);
-    FillCmbItmQGrp(surface);
-    FillCmbPrice(surface);
+    FillCmbItmBelong(surface, context);
+    FillCmbItmQGrp(surface, context);
+    FillCmbPrice(surface, context);
     EXPECT_EQ(entries("cmbItmBelong"), (QStringList{QStringLiteral("מוצרי חלב=1"), "x=14"}));
     EXPECT_EQ(entries("cmbItmQGrp"), QStringList{"kosher=8"});
     EXPECT_EQ(entries("cmbPriceField"), (QStringList{"base=1", "vip=10"}));
@@ -45,23 +45,23 @@ TEST_F(HostListsTest, CombosTakeNamedRecordsWithTheirNumbers) {
 
     // A damaged file is told, and the combo keeps what it had.
     QFile::resize(company() + "/opln.dbf", 40);
-    FillCmbPrice(surface);
+    FillCmbPrice(surface, context);
     EXPECT_EQ(entries("cmbPriceField"), (QStringList{"base=1", "vip=10"}));
     ASSERT_EQ(messages.shown.size(), 1);
     EXPECT_TRUE(messages.shown[0].text.contains("opln.dbf"));
 }
 
 TEST_F(HostListsTest, CurrenciesAreAddedOrEditedAndTheLocalOneShowsTheShekelSign) {
-    EXPECT_FALSE(ReadCoinsMNHL(surface, company(), path(db::kDocDatabaseFile)));  // no ocrn.dbf
+    EXPECT_FALSE(ReadCoinsMNHL(surface, context, company(), path(db::kDocDatabaseFile)));  // no ocrn.dbf
     // The delivered file holds the local currency; its blank description is kept.
     write("ocrn.dbf",
           QList<CurrencyRecord>{
               {QStringLiteral("¦"), "", "x", ""}, {"$", "dollar", "USD", "$"}, {"A'", "", "", ""}});
-    ASSERT_TRUE(ReadCoinsMNHL(surface, company(), path(db::kDocDatabaseFile)));
+    ASSERT_TRUE(ReadCoinsMNHL(surface, context, company(), path(db::kDocDatabaseFile)));
     const QStringList expected{"$|dollar|$|USD", "A'|Null|Null|Null",
                                QStringLiteral("¦|שקל חדש|₪|₪")};
     EXPECT_EQ(currencies(), expected);
-    ASSERT_TRUE(ReadCoinsMNHL(surface, company(), path(db::kDocDatabaseFile)));
+    ASSERT_TRUE(ReadCoinsMNHL(surface, context, company(), path(db::kDocDatabaseFile)));
     EXPECT_EQ(currencies(), expected);
     EXPECT_TRUE(messages.shown.isEmpty());
 }
@@ -76,7 +76,7 @@ TEST_F(HostListsTest, SpecialPricesAreStagedOncePerAccountAndItem) {
                                                 deleted,
                                                 {"AB\"C", "20002", {-99, "$"}},
                                                 {"AB\"C", "20001", {7, {}}}});
-    ASSERT_TRUE(ReadSpecialPriceMNHL(surface, company(), temp, {}, {}));
+    ASSERT_TRUE(ReadSpecialPriceMNHL(surface, context, company(), temp, {}, {}));
     EXPECT_EQ(rows(db::kTempItemDatabaseFile,
                    "SELECT AccountKey, ItemKey, Price, Coin FROM tTempAlterPrices "
                    "ORDER BY AccountKey"),

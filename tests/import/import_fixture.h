@@ -10,8 +10,8 @@
 
 #include "db/file_names.h"
 #include "db/local_databases.h"
-#include "import/connection.h"
-#include "surface/surface_progress.h"
+#include "card/import_adapters.h"
+#include "platform/context.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "jet/vb.h"
@@ -30,15 +30,16 @@ class ImportTest : public ::testing::Test {
         ASSERT_TRUE(QDir().mkpath(folder()));
         ASSERT_TRUE(QFile::copy(ETIQUON_DELIVERED_KDB, path(db::kDocDatabaseFile)));
         QFile::setPermissions(path(db::kDocDatabaseFile), QFile::ReadOwner | QFile::WriteOwner);
-        connParams().server = dir.path();
-        connParams().database = QStringLiteral("company");
+        context.connection.server = dir.path();
+        context.connection.database = QStringLiteral("company");
+        context.setMessages(&messages);
         surface.control("txtDBPath").setText(folder());
-        ProgressBar::setObserver([this](int fill, int) {
-            widths << fill;
+        surface.watchWidths([this](const QString& name, int width) {
+            if (name != u"ProgressFill") return;
+            widths << width;
             steps << surface.control("Message1").caption();
         });
     }
-    void TearDown() override { ProgressBar::setObserver({}); }
 
     QString company() const { return dir.filePath("company"); }
     QString folder() const { return dir.filePath("db"); }
@@ -53,8 +54,8 @@ class ImportTest : public ::testing::Test {
     QString prepareTempDatabase() {
         const QString items = path(db::kItemDatabaseFile);
         if (!QFile::exists(items)) {
-            EXPECT_FALSE(db::CreateItemDatabase(items).isEmpty());
-            EXPECT_FALSE(db::AddAccountTables(items).isEmpty());
+            db::CreateItemDatabase(items);
+            db::AddAccountTables(items);
         }
         return db::CreateTempItemDatabase(path(db::kTempItemDatabaseFile), items);
     }
@@ -83,6 +84,7 @@ class ImportTest : public ::testing::Test {
     QTemporaryDir dir;
     MemorySurface surface;
     RecordingMessages messages;
+    Context context;
     QList<int> widths;  // every width the progress bar took
     QStringList steps;  // Message1 at each of those moments
 };

@@ -13,7 +13,7 @@ class ItemReaderTest : public ImportTest {
   protected:
     bool read(qint16 foreign = 0, qint16 copies = 1, qint16 priceField = 1,
               bool priceLists = false) {
-        return ReadItemMNHL(surface, company(), temp, {}, {}, foreign, copies, priceField, true,
+        return ReadItemMNHL(surface, context, company(), temp, {}, {}, foreign, copies, priceField, true,
                             false, priceLists);
     }
     QStringList items(const QString& fields = "ItemKey") const {

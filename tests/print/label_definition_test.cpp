@@ -18,7 +18,6 @@ class LabelDefinitionTest : public ::testing::Test {
     void SetUp() override {
         QDir(QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation) + "/Etiquon")
             .removeRecursively();
-        setApplicationName("Etiquon");
     }
     static void store(const QString& section, const QString& key, const QString& value) {
         SettingsStore s("Etiquon");
@@ -34,7 +33,7 @@ class LabelDefinitionTest : public ::testing::Test {
 TEST_F(LabelDefinitionTest, EmptyStoreGivesTheDefaults) {
     EXPECT_EQ(def.page.PageRows, 0);  // nothing before the first load
     EXPECT_EQ(def.cells[0].FontSize, 0);
-    GetSetLabelDef(LoadLabelDef, def);
+    GetSetLabelDef(LoadLabelDef, "Etiquon", def);
     for (const LabelCell& cell : def.cells) {
         EXPECT_FALSE(cell.UseCell);
         EXPECT_EQ(cell.FldID, -1);
@@ -62,12 +61,12 @@ TEST_F(LabelDefinitionTest, TrueReadsAsMinusOneAndSavesAsMinusOne) {
     store("2LabelDef", "FldID", "True");  // a number field takes it as -1 too
     store("DirectLabel", "PageAutoPrint", "False");
     store("LabelBar", "ShowDesc", "True");
-    GetSetLabelDef(LoadLabelDef, def);
+    GetSetLabelDef(LoadLabelDef, "Etiquon", def);
     EXPECT_TRUE(def.cells[2].UseCell);
     EXPECT_TRUE(def.cells[2].Border);
     EXPECT_EQ(def.cells[2].FldID, -1);
     EXPECT_TRUE(def.bar.ShowDesc);
-    GetSetLabelDef(SaveLabelDef, def);
+    GetSetLabelDef(SaveLabelDef, "Etiquon", def);
     EXPECT_EQ(stored("2LabelDef", "UseCell"), "-1");
     EXPECT_EQ(stored("2LabelDef", "FontUL"), "0");
     EXPECT_EQ(stored("LabelBar", "ShowDesc"), "-1");
@@ -80,16 +79,16 @@ TEST_F(LabelDefinitionTest, TrueReadsAsMinusOneAndSavesAsMinusOne) {
 }
 
 TEST_F(LabelDefinitionTest, SavedDefinitionLoadsBackUnchanged) {
-    GetSetLabelDef(LoadLabelDef, def);
+    GetSetLabelDef(LoadLabelDef, "Etiquon", def);
     def.cells[5] = {true, 4, {}, 1, 2, 14, 2, true, true, 0, 0, "מחיר:", false, 12, true};
     def.bar.BarType = 6;
     def.bar.LeftPrefix = "X";
     def.bar.LeftLen = 3;
     def.bar.DimX = 0.015f;
     def.page = {8, 3, true, 20, 2, 1};
-    GetSetLabelDef(SaveLabelDef, def);
+    GetSetLabelDef(SaveLabelDef, "Etiquon", def);
     LabelDefinition loaded;
-    GetSetLabelDef(LoadLabelDef, loaded);
+    GetSetLabelDef(LoadLabelDef, "Etiquon", loaded);
     const LabelCell& c = loaded.cells[5];
     EXPECT_TRUE(c.UseCell && c.FontUL && c.FontItalic && c.Border);
     EXPECT_EQ(c.FldID, 4);
@@ -113,24 +112,24 @@ TEST_F(LabelDefinitionTest, SavedDefinitionLoadsBackUnchanged) {
 TEST_F(LabelDefinitionTest, NegativeBarTypeSkipsTheBarSectionFromThenOn) {
     store("LabelBar", "BarType", "-1");
     store("LabelBar", "UserResoX", "300");
-    GetSetLabelDef(LoadLabelDef, def);  // read while the bar type was still 0
+    GetSetLabelDef(LoadLabelDef, "Etiquon", def);  // read while the bar type was still 0
     EXPECT_EQ(def.bar.BarType, -1);
     EXPECT_EQ(def.bar.UserResoX, 300);
     store("LabelBar", "UserResoX", "400");
-    GetSetLabelDef(LoadLabelDef, def);
+    GetSetLabelDef(LoadLabelDef, "Etiquon", def);
     EXPECT_EQ(def.bar.UserResoX, 300);  // not read again
     def.bar.UserResoX = 500;
-    GetSetLabelDef(SaveLabelDef, def);
+    GetSetLabelDef(SaveLabelDef, "Etiquon", def);
     EXPECT_EQ(stored("LabelBar", "UserResoX"), "400");  // nor written
 }
 
 TEST_F(LabelDefinitionTest, UnreadableValueLeavesTheFieldAndTheRestLoads) {
-    GetSetLabelDef(LoadLabelDef, def);
+    GetSetLabelDef(LoadLabelDef, "Etiquon", def);
     store("0LabelDef", "FontSize", "big");
     store("0LabelDef", "Align", "300");  // beyond a byte
     store("0LabelDef", "Height", "7");
     store("LabelBar", "BarHeight", "0.5");
-    GetSetLabelDef(LoadLabelDef, def);
+    GetSetLabelDef(LoadLabelDef, "Etiquon", def);
     EXPECT_EQ(def.cells[0].FontSize, 9);
     EXPECT_EQ(def.cells[0].Align, 1);
     EXPECT_EQ(def.cells[0].Height, 7);

@@ -7,6 +7,7 @@
 #include "platform/codepage1255.h"
 #include "platform/print_folder.h"
 #include "print/label_query.h"
+#include "card/print_adapters.h"
 #include "print_fixture.h"
 
 namespace etq::print::test {
@@ -24,7 +25,7 @@ class LabelPageTest : public PrintTest {
     // Writes the page of the item labels and returns its lines.
     QStringList writePage() {
         const QString file = dir.path() + "/page.htm";
-        CreateLabFile(surface, file, workDb(), ItemLabels, Ascending, def);
+        CreateLabFile(surface, context, file, workDb(), ItemLabels, Ascending);
         QFile f(file);
         EXPECT_TRUE(f.open(QIODevice::ReadOnly));
         bytes = f.readAll();
@@ -213,17 +214,14 @@ TEST(PrintFolderTest, EmptyingDeletesFilesAndKeepsFolders) {
     EXPECT_THROW(deleteFilesIn(dir.path() + "/none"), std::runtime_error);
 }
 
-class PrintRunTest : public LabelPageTest {
-  protected:
-    RecordingViewer viewer;
-};
+using PrintRunTest = LabelPageTest;
 
 TEST_F(PrintRunTest, EmptiesTheFolderMakesBitmapsAndShowsThePage) {
     addItems({{"A", "סבון", "7290000000015"}, {"B", "מברשת", "7290000000022"}});
     useCell(0, 1);
     useCell(1, 4, 1);
     def.bar.BarType = 6;
-    QString page = PrintBuiltInLabels(surface, workDb(), ItemLabels, def);
+    QString page = PrintBuiltInLabels(surface, context, workDb(), ItemLabels);
     ASSERT_FALSE(page.isEmpty());
     const QString folder = QFileInfo(page).path();
     EXPECT_TRUE(folder.endsWith("/etiquon/etiqon"));
@@ -235,7 +233,7 @@ TEST_F(PrintRunTest, EmptiesTheFolderMakesBitmapsAndShowsThePage) {
 
     // The next run starts from an empty folder; a negative bar type makes no bitmaps.
     def.bar.BarType = -1;
-    page = PrintBuiltInLabels(surface, workDb(), ItemLabels, def);
+    page = PrintBuiltInLabels(surface, context, workDb(), ItemLabels);
     EXPECT_EQ(QDir(folder).entryList(QDir::Files), QStringList{"etiqon1.htm"});
 }
 
@@ -243,7 +241,7 @@ TEST_F(PrintRunTest, RefusedBarcodesAreReportedAndThePageStillShown) {
     addItems({{"A", "סבון", "ABC"}, {"B", "מברשת", "7290000000022"}});
     useCell(0, 4, 1);
     def.bar.BarType = 6;
-    EXPECT_FALSE(PrintBuiltInLabels(surface, workDb(), ItemLabels, def).isEmpty());
+    EXPECT_FALSE(PrintBuiltInLabels(surface, context, workDb(), ItemLabels).isEmpty());
     ASSERT_EQ(messages.shown.size(), 1);
     EXPECT_EQ(messages.shown[0].title, "תקלה");
     EXPECT_TRUE(messages.shown[0].text.startsWith("1 labels have no barcode:\nB0400001.BMP"));
@@ -254,7 +252,7 @@ TEST_F(PrintRunTest, BarcodeOnAnUntickedFieldFailsUntilTheBoxIsTicked) {
     addItems({{"A", "סבון", "7290000000015"}});
     useCell(0, 8, 1);  // serial number: a column only when its box is ticked
     for (int run = 0; run < 2; ++run) {
-        EXPECT_TRUE(PrintBuiltInLabels(surface, workDb(), ItemLabels, def).isEmpty());
+        EXPECT_TRUE(PrintBuiltInLabels(surface, context, workDb(), ItemLabels).isEmpty());
         ASSERT_EQ(messages.shown.size(), run + 1);
         EXPECT_EQ(messages.shown.last().title, "תקלה");
         EXPECT_EQ(messages.shown.last().icon, MsgIcon::Critical);
@@ -263,12 +261,12 @@ TEST_F(PrintRunTest, BarcodeOnAnUntickedFieldFailsUntilTheBoxIsTicked) {
     EXPECT_TRUE(viewer.shown.isEmpty());
     surface.control("ChkFldSend", 8).setValue(1);
     def.bar.BarType = 2;
-    EXPECT_FALSE(PrintBuiltInLabels(surface, workDb(), ItemLabels, def).isEmpty());
+    EXPECT_FALSE(PrintBuiltInLabels(surface, context, workDb(), ItemLabels).isEmpty());
 }
 
 TEST_F(PrintRunTest, MissingDatabaseIsReported) {
     useCell(0, 1);
-    EXPECT_TRUE(PrintBuiltInLabels(surface, dir.path() + "/none.tmp", ItemLabels, def).isEmpty());
+    EXPECT_TRUE(PrintBuiltInLabels(surface, context, dir.path() + "/none.tmp", ItemLabels).isEmpty());
     ASSERT_EQ(messages.shown.size(), 1);
     EXPECT_EQ(messages.shown[0].title, "תקלה");
 }

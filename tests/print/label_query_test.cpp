@@ -2,7 +2,9 @@
 // real working database.
 #include "print/label_query.h"
 
+#include "card/print_adapters.h"
 #include "print_fixture.h"
+#include "surface/control_values.h"
 
 namespace etq::print::test {
 namespace {
@@ -117,7 +119,8 @@ TEST(LabelQueryText, SurfaceGivesTheLabelTabsValues) {
     surface.control("ChkFldSend", 12).setValue(1);
     surface.control("ChkFldSend", 13).setValue(2);  // grey is not checked
     surface.control("OptPrinter", 1).setValue(true);
-    const LabelQueryInput in = labelQueryInput(surface, ItemLabels, labelOrder(surface));
+    const SurfaceValues values(surface);
+    const LabelQueryInput in = readLabelQueryInput(values, ItemLabels, labelOrder(values));
     EXPECT_EQ(in.order, Descending);
     EXPECT_TRUE(in.useAccountKey);
     EXPECT_EQ(in.accountKey, "C1");
@@ -125,7 +128,7 @@ TEST(LabelQueryText, SurfaceGivesTheLabelTabsValues) {
     EXPECT_TRUE(in.fieldChecks[12]);
     EXPECT_FALSE(in.fieldChecks[13]);
     surface.control("OptPrinter", 0).setValue(true);
-    EXPECT_EQ(labelOrder(surface), Ascending);
+    EXPECT_EQ(labelOrder(values), Ascending);
 }
 
 // The statements run on the working database of a real folder.

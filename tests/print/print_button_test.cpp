@@ -1,6 +1,6 @@
 // The item print button and the built-in label definition as the control runs them: wired by
 // connectParts, on the headless surface, with the settings store and a stand-in CUPS.
-#include "print/print_buttons.h"
+#include "card/print_adapters.h"
 
 #include <QFileInfo>
 
@@ -17,11 +17,10 @@ class PrintButtonTest : public PrintTest {
         PrintTest::SetUp();
         controller.hooks().installedPrinters = [] { return QStringList{"Zebra_GK420"}; };
         connectParts(controller, surface);
-        labelDefinition() = def;
         labelDefinition().cells[0].UseCell = true;
         labelDefinition().cells[0].FldID = 1;
     }
-    void TearDown() override { labelDefinition() = LabelDefinition{}; }
+    LabelDefinition& labelDefinition() { return context.labelDefinition(); }
 
     // Puts a stand-in lpoptions first on PATH that logs its arguments, or fails.
     void fakeLpoptions(bool fail) {
@@ -33,8 +32,7 @@ class PrintButtonTest : public PrintTest {
         script.setPermissions(script.permissions() | QFile::ExeOwner);
         qputenv("PATH", (cups.path() + ":").toLocal8Bit() + path);
     }
-    CardController controller{surface};
-    RecordingViewer viewer;
+    CardController controller{surface, context};
     QTemporaryDir cups;
     QByteArray path = qgetenv("PATH");
 };

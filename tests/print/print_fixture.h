@@ -5,7 +5,9 @@
 
 #include "db/db_fixture.h"
 #include "platform/browser.h"
+#include "platform/context.h"
 #include "platform/settings_store.h"
+#include "support/recording_messages.h"
 #include "print/label_definition.h"
 #include "surface/memory_surface.h"
 
@@ -25,8 +27,6 @@ struct Item {
 // Keeps the pages shown instead of opening a browser.
 class RecordingViewer : public PageViewer {
   public:
-    RecordingViewer() { setPageViewer(this); }
-    ~RecordingViewer() override { setPageViewer(nullptr); }
     bool showPage(const QString& path, QString*) override {
         shown.append(path);
         return true;
@@ -41,15 +41,15 @@ class PrintTest : public db::test::DbFolderTest {
     void SetUp() override {
         QDir(QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation) + "/Etiquon")
             .removeRecursively();
-        setApplicationName("Etiquon");
+        context.setMessages(&messages);
+        context.setPages(&viewer);
         DbFolderTest::SetUp();
-        ASSERT_FALSE(createWork(false).isEmpty());
+        createWork(false);
         surface.control("txtDBPath").setText(dir.path());
         surface.control("txtCompanyName").setText("Corvan Information Systems");
         surface.control("OptOLE", 3).setValue(true);
         surface.control("OptPrinter", 0).setValue(true);  // ascending
-        def = LabelDefinition{};
-        GetSetLabelDef(LoadLabelDef, def);
+        GetSetLabelDef(LoadLabelDef, context.applicationName, def);
     }
 
     void addItems(const QList<Item>& items) {
@@ -83,7 +83,10 @@ class PrintTest : public db::test::DbFolderTest {
     QString workDb() const { return path(db::kWorkDatabaseFile); }
 
     MemorySurface surface;
-    LabelDefinition def;
+    etq::test::RecordingMessages messages;
+    RecordingViewer viewer;
+    Context context;
+    LabelDefinition& def = context.labelDefinition();  // the run's definition
 };
 
 }  // namespace etq::print::test
