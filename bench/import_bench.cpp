@@ -21,8 +21,8 @@
 #include "db/file_names.h"
 #include "db/local_databases.h"
 #include "import/item_reader.h"
+#include "platform/progress.h"
 #include "samples/host_records.h"
-#include "surface/memory_surface.h"
 
 namespace {
 
@@ -52,8 +52,8 @@ ItemRecord benchItem(int i) {
 // A new item database, as a first import makes it.
 QString freshItemDatabase(const QString& folder) {
     const QString path = db::inFolder(folder, db::kItemDatabaseFile);
-    if (db::CreateItemDatabase(path).isEmpty() || db::AddAccountTables(path).isEmpty())
-        std::exit(1);
+    db::CreateItemDatabase(path);
+    db::AddAccountTables(path);
     return path;
 }
 
@@ -66,17 +66,18 @@ double plainInsert(const QString& path, const QList<ItemRecord>& items) {
     QElapsedTimer timer;
     timer.start();
     check(sqlite3_exec(db, "BEGIN", nullptr, nullptr, nullptr), db);
-    check(sqlite3_prepare_v2(db,
-                             "INSERT INTO tItems (ItemKey, ItemName, Fname, ItemSort, Unit, "
-                             "BarCode, SuppCatNum, Copies, Price, Coin, SalPackUN, PurPackUN) "
-                             "VALUES (?1, ?2, ?3, ?4, ?5, ?6, ?7, ?8, ?9, ?10, ?11, ?12)",
-                             -1, &item, nullptr),
-          db);
-    check(sqlite3_prepare_v2(db,
-                             "INSERT INTO tPriceList (ItemKey, PriceList, Price, Currency) "
-                             "VALUES (?1, ?2, ?3, ?4)",
-                             -1, &price, nullptr),
-          db);
+    check(
+        sqlite3_prepare_v2(
+            db,
+            "INSERT INTO tItems (ItemKey, ItemName, Fname, ItemSort, Unit, BarCode, SuppCatNum, Copies, Price, Coin, SalPackUN, PurPackUN) VALUES (?1, ?2, ?3, ?4, ?5, ?6, ?7, ?8, ?9, ?10, ?11, ?12)",
+            -1, &item, nullptr),
+        db);
+    check(
+        sqlite3_prepare_v2(
+            db,
+            "INSERT INTO tPriceList (ItemKey, PriceList, Price, Currency) VALUES (?1, ?2, ?3, ?4)",
+            -1, &price, nullptr),
+        db);
     for (const ItemRecord& it : items) {
         bindText(item, 1, it.key);
         bindText(item, 2, it.name);
@@ -114,11 +115,15 @@ double import(const QString& company, const QString& folder) {
     const QString itemDb = freshItemDatabase(folder);
     const QString tempDb =
         db::CreateTempItemDatabase(db::inFolder(folder, db::kTempItemDatabaseFile), itemDb);
-    etq::MemorySurface surface;
+    etq::ItemReadOptions options;
+    options.companyFolder = company;
+    options.databasePath = tempDb;
+    options.copies = 1;
+    options.stagePriceLists = true;
+    etq::NoProgress progress;
     QElapsedTimer timer;
     timer.start();
-    if (!etq::ReadItemMNHL(surface, company, tempDb, {}, {}, 0, 1, 1, true, false, true))
-        std::exit(1);
+    etq::readHostItems(options, progress);
     db::MergeTempItems(tempDb);
     return timer.nsecsElapsed() / 1e9;
 }

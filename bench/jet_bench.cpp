@@ -183,10 +183,10 @@ double recordsetFindEdit(const QString& path, const QList<Item>& items) {
 QString findPlan(const QString& path) {
     sqlite3* db = nullptr;
     sqlite3_open(path.toUtf8().constData(), &db);
-    const QString find = QString(
-                             "EXPLAIN QUERY PLAN SELECT rowid FROM \"tItems\" WHERE (%1) AND rowid "
-                             ">= 0 ORDER BY rowid")
-                             .arg(sql::translateCriterion("ItemKey=\"100\"").sql);
+    const QString find =
+        QString(
+            "EXPLAIN QUERY PLAN SELECT rowid FROM \"tItems\" WHERE (%1) AND rowid >= 0 ORDER BY rowid")
+            .arg(sql::translateCriterion("ItemKey=\"100\"").sql);
     sqlite3_stmt* s = nullptr;
     sqlite3_prepare_v2(db, find.toUtf8().constData(), -1, &s, nullptr);
     QString plan;

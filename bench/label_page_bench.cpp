@@ -16,14 +16,13 @@
 #include "db/local_databases.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
-#include "platform/browser.h"
 #include "platform/print_folder.h"
+#include "platform/progress.h"
 #include "platform/settings_store.h"
 #include "print/barcode_images.h"
 #include "print/label_definition.h"
 #include "print/label_page.h"
 #include "print/label_query.h"
-#include "surface/memory_surface.h"
 
 using namespace etq;
 
@@ -43,20 +42,15 @@ double median(QList<double> values) {
     return values[values.size() / 2];
 }
 
-class SilentViewer : public PageViewer {
-  public:
-    bool showPage(const QString&, QString*) override { return true; }
-};
-
 QString prepareFolder(const QString& folder, int labels) {
     const QString docDb = db::inFolder(folder, db::kDocDatabaseFile);
     const QString itemDb = db::inFolder(folder, db::kItemDatabaseFile);
     const QString workDb = db::inFolder(folder, db::kWorkDatabaseFile);
     QFile::copy(ETIQUON_DELIVERED_KDB, docDb);
     QFile::setPermissions(docDb, QFile::ReadOwner | QFile::WriteOwner);
-    if (db::CreateItemDatabase(itemDb).isEmpty() || db::AddAccountTables(itemDb).isEmpty() ||
-        db::CreateDocDatabase(docDb, itemDb, workDb, {}).isEmpty())
-        return {};
+    db::CreateItemDatabase(itemDb);
+    db::AddAccountTables(itemDb);
+    db::CreateDocDatabase(docDb, itemDb, workDb, {});
     jet::Database items = jet::Database::open(itemDb);
     items.beginTrans();
     jet::Recordset rs = items.openRecordset(QStringLiteral("tItems"));
@@ -125,18 +119,16 @@ int main(int argc, char** argv) {
     const QString workDb = prepareFolder(folder, labels);
     if (workDb.isEmpty()) return 1;
 
-    MemorySurface surface;
-    surface.control("txtDBPath").setText(folder);
-    surface.control("OptOLE", 3).setValue(true);
-    surface.control("OptPrinter", 0).setValue(true);
+    LabelPageInput input;
+    input.query.queryType = ItemLabels;
+    input.query.order = Ascending;
     LabelDefinition def;
-    GetSetLabelDef(LoadLabelDef, def);
+    GetSetLabelDef(LoadLabelDef, QStringLiteral("Etiquon"), def);
     def.cells[0].UseCell = true;
     def.cells[0].FldID = 4;  // BarCode
     def.cells[0].ViewType = 1;
     def.bar.BarType = 6;  // EAN-13
-    SilentViewer viewer;
-    setPageViewer(&viewer);
+    NoProgress progress;
 
     // Rounds as a user runs them: each print run first deletes the bitmaps of the one before.
     // zint writes into an emptied folder each round.
@@ -147,7 +139,7 @@ int main(int argc, char** argv) {
     QElapsedTimer timer;
     for (int round = 0; round < kRounds; ++round) {
         timer.start();
-        page = PrintBuiltInLabels(surface, workDb, ItemLabels, def);
+        page = printBuiltInLabels(workDb, input, def, progress).pagePath;
         runs.append(timer.nsecsElapsed() / 1e9);
         if (page.isEmpty()) return 1;
         QDir(scratch.path() + "/zint").removeRecursively();
@@ -158,11 +150,10 @@ int main(int argc, char** argv) {
 
     // The parts alone: the bitmaps with one library instance, and the page.
     timer.restart();
-    MakeBarcodeImages(printFolder(), "BarCode", 4, workDb,
-                      BuildLabelQuery(labelQueryInput(surface, ItemLabels, Ascending)), def.bar);
+    MakeBarcodeImages(printFolder(), "BarCode", 4, workDb, BuildLabelQuery(input.query), def.bar);
     const double images = timer.nsecsElapsed() / 1e9;
     timer.restart();
-    CreateLabFile(surface, page, workDb, ItemLabels, Ascending, def);
+    writeLabelPage(page, workDb, input, def, progress);
     const double pageOnly = timer.nsecsElapsed() / 1e9;
 
     const double whole = median(runs);

@@ -2,8 +2,8 @@
 #include <QTextStream>
 
 #include "app/cli_command.h"
-#include "platform/settings_store.h"
 #include "platform/settings_keys.h"
+#include "platform/settings_store.h"
 
 namespace etq::cli {
 
@@ -65,9 +65,8 @@ int setSetting(SettingsStore& store, const QString& section, const QString& key,
 }
 
 int usage() {
-    printError(
-        QStringLiteral("usage: config list | get SECTION KEY | set SECTION KEY VALUE "
-                       "[--setting-id N]"));
+    printError(QStringLiteral(
+        "usage: config list | get SECTION KEY | set SECTION KEY VALUE [--setting-id N]"));
     return 2;
 }
 

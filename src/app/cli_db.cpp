@@ -60,9 +60,10 @@ int runInitDb(const QStringList& arguments) {
     } else {
         const QString delivered = db::deliveredDocumentDatabase();
         if (delivered.isEmpty()) {
-            printError(QString("the delivered document database %1 is not installed beside the "
-                               "program nor in its share/etiquon folder")
-                           .arg(db::kDocDatabaseFile));
+            printError(
+                QString(
+                    "the delivered document database %1 is not installed beside the program nor in its share/etiquon folder")
+                    .arg(db::kDocDatabaseFile));
             return 1;
         }
         if (!QFile::copy(delivered, docDb)) {

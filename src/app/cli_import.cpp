@@ -21,9 +21,7 @@ namespace etq::cli {
 namespace {
 
 const char kUsage[] =
-    "usage: etiquon-cli import-items --company DIR --db DIR [--clean] [--price-field N] "
-    "[--from KEY] [--to KEY] [--price-lists] [--special-prices] [--foreign-names] "
-    "[--copies N] [--setting-id N]";
+    "usage: etiquon-cli import-items --company DIR --db DIR [--clean] [--price-field N] [--from KEY] [--to KEY] [--price-lists] [--special-prices] [--foreign-names] [--copies N] [--setting-id N]";
 
 int usage() {
     printError(kUsage);
@@ -171,9 +169,10 @@ int runImportItems(const QStringList& arguments) {
     }
     const QString docDb = db::inFolder(options.folder, db::kDocDatabaseFile);
     if (!QFileInfo::exists(docDb)) {
-        printError(QString("%1 holds no document database %2; etiquon-cli init-db --db %1 "
-                           "installs the delivered one")
-                       .arg(options.folder, db::kDocDatabaseFile));
+        printError(
+            QString(
+                "%1 holds no document database %2; etiquon-cli init-db --db %1 installs the delivered one")
+                .arg(options.folder, db::kDocDatabaseFile));
         return 1;
     }
 

@@ -45,7 +45,9 @@ QString takeOption(QStringList& args, const QString& name) {
     return {};
 }
 
-bool takeFlag(QStringList& args, const QString& name) { return args.removeAll(name) > 0; }
+bool takeFlag(QStringList& args, const QString& name) {
+    return args.removeAll(name) > 0;
+}
 
 void printError(const QString& message) {
     QTextStream(stderr) << "etiquon-cli: " << message << Qt::endl;
@@ -67,12 +69,12 @@ int runReporting(const std::function<void()>& work) {
     }
 }
 
-int runConfig(const QStringList& args);  // cli_config.cpp
-int runInitDb(const QStringList& args);  // cli_db.cpp
-int runUpgrade(const QStringList& args);  // cli_db.cpp
+int runConfig(const QStringList& args);       // cli_config.cpp
+int runInitDb(const QStringList& args);       // cli_db.cpp
+int runUpgrade(const QStringList& args);      // cli_db.cpp
 int runImportItems(const QStringList& args);  // cli_import.cpp
-int runMarkItems(const QStringList& args);  // cli_print.cpp
-int runPrintItems(const QStringList& args);  // cli_print.cpp
+int runMarkItems(const QStringList& args);    // cli_print.cpp
+int runPrintItems(const QStringList& args);   // cli_print.cpp
 
 namespace {
 
@@ -87,8 +89,7 @@ const Command kCommands[] = {
     {"init-db", "--db DIR", "prepare a database folder for a first run", runInitDb},
     {"upgrade", "--db DIR", "add the account tables to an older item database", runUpgrade},
     {"import-items",
-     "--company DIR --db DIR [--clean] [--price-field N] [--from KEY] [--to KEY] "
-     "[--price-lists] [--special-prices] [--foreign-names] [--copies N]",
+     "--company DIR --db DIR [--clean] [--price-field N] [--from KEY] [--to KEY] [--price-lists] [--special-prices] [--foreign-names] [--copies N]",
      "read the host's items, prices and currencies into the item database", runImportItems},
     {"mark-items", "--db DIR (--all | --none | KEY...) [--copies N]",
      "mark items for printing and set their copies", runMarkItems},
@@ -106,8 +107,7 @@ void printHelp() {
         const QString head = QString("  %1 %2").arg(c.name, c.usage).trimmed();
         out << "  " << head.leftJustified(44) << " " << c.summary << "\n";
     }
-    out << "\nOptions:\n  --setting-id N   use the settings of the hosting page with this "
-           "SettingID\n";
+    out << "\nOptions:\n  --setting-id N   use the settings of the hosting page with this SettingID\n";
 }
 
 }  // namespace

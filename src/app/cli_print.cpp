@@ -43,8 +43,7 @@ EntryList printerEntries() {
 
 int markUsage() {
     printError(
-        "usage: etiquon-cli mark-items --db DIR (--all | --none | KEY...) [--copies N] "
-        "[--setting-id N]");
+        "usage: etiquon-cli mark-items --db DIR (--all | --none | KEY...) [--copies N] [--setting-id N]");
     return 2;
 }
 

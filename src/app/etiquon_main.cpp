@@ -44,21 +44,20 @@ int main(int argc, char** argv) {
     QApplication::setFont(font);
 
     QCommandLineParser parser;
-    parser.setApplicationDescription(
-        QStringLiteral("Prints labels for the items and stock documents of a Hebrew accounting "
-                       "package."));
+    parser.setApplicationDescription(QStringLiteral(
+        "Prints labels for the items and stock documents of a Hebrew accounting package."));
     parser.addHelpOption();
     parser.addVersionOption();
-    const QCommandLineOption settingId(QStringLiteral("setting-id"),
-                                       QStringLiteral("Use the settings of the hosting page with "
-                                                      "this SettingID."),
-                                       QStringLiteral("N"));
+    const QCommandLineOption settingId(
+        QStringLiteral("setting-id"),
+        QStringLiteral("Use the settings of the hosting page with this SettingID."),
+        QStringLiteral("N"));
     const QCommandLineOption english(QStringLiteral("english"),
                                      QStringLiteral("Messages and dialogs in English."));
-    const QCommandLineOption screenshots(QStringLiteral("screenshots"),
-                                         QStringLiteral("Save a picture of every tab into "
-                                                        "FOLDER and quit."),
-                                         QStringLiteral("FOLDER"));
+    const QCommandLineOption screenshots(
+        QStringLiteral("screenshots"),
+        QStringLiteral("Save a picture of every tab into FOLDER and quit."),
+        QStringLiteral("FOLDER"));
     parser.addOptions({settingId, english, screenshots});
     parser.process(app);
 

@@ -26,8 +26,7 @@ qint16 copiesOf(const ControlValues& values) {
 
 // The price entry that gives the items their price: the number behind the chosen price list.
 qint16 priceFieldOf(const ControlValues& values) {
-    if (const auto number = selectedNumber(values, QStringLiteral("cmbPriceField")))
-        return *number;
+    if (const auto number = selectedNumber(values, QStringLiteral("cmbPriceField"))) return *number;
     jet::fail(jet::err::kInvalidArgument,
               QStringLiteral("No price list is chosen in cmbPriceField."));
 }
@@ -51,8 +50,7 @@ HostList listOf(QStringView combo) {
 
 void fillCombo(const Surface& surface, Context& context, const QString& combo) {
     reportFailures(context, context.caption(1), [&] {
-        const EntryList entries =
-            readHostList(companyFolder(context.connection), listOf(combo));
+        const EntryList entries = readHostList(companyFolder(context.connection), listOf(combo));
         const ControlRef box = surface.control(combo);
         box.clearList();
         for (const ListEntry& entry : entries)

@@ -58,7 +58,8 @@ LabelQueryInput readLabelQueryInput(const ControlValues& values, quint8 queryTyp
     in.fromItem = values.text(QStringLiteral("txtFromItem"));
     in.toItem = values.text(QStringLiteral("txtToItem"));
     for (const LabelFieldSlot& slot : labelFieldSlots())
-        in.fieldChecks[size_t(slot.slot)] = values.isChecked(QStringLiteral("ChkFldSend"), slot.slot);
+        in.fieldChecks[size_t(slot.slot)] =
+            values.isChecked(QStringLiteral("ChkFldSend"), slot.slot);
     in.companyName = values.text(QStringLiteral("txtCompanyName"));
     return in;
 }

@@ -54,8 +54,7 @@ QString CreateDocDatabase(const QString& docRefPath, const QString& itemDbPath,
 QString CreateItemDatabase(const QString& path) {
     removeExisting(path);
     Database db = Database::create(path);
-    for (const jet::TableDef* t :
-         {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
+    for (const jet::TableDef* t : {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
         db.createTable(*t);
     createQueries(db, schema::kItemQueries, std::size(schema::kItemQueries));
     return path;

@@ -81,21 +81,9 @@ const QList<Link>& workLinks() {
 
 const SavedQuery kWorkQueries[2] = {
     {"qSelectDocHeaders",
-     "SELECT (tDocTypes.DocDesc + '') AS MyDocDesc , tTempDocHeaders.Reference1, "
-     "Format$(tTempDocHeaders.DocDate,'dd/mm/yy'), tTempDocHeaders.AccountKey, "
-     "tTempDocHeaders.Include, "
-     "tTempDocHeaders.CardName, tTempDocHeaders.WizFileID, tTempDocHeaders.Number FROM "
-     "(tTempDocHeaders Inner "
-     "Join tDocTypes On tDocTypes.DocType = tTempDocHeaders.DocType) ORDER BY "
-     "tTempDocHeaders.DocType, "
-     "tTempDocHeaders.Reference1, tTempDocHeaders.DocDate"},
+     "SELECT (tDocTypes.DocDesc + '') AS MyDocDesc , tTempDocHeaders.Reference1, Format$(tTempDocHeaders.DocDate,'dd/mm/yy'), tTempDocHeaders.AccountKey, tTempDocHeaders.Include, tTempDocHeaders.CardName, tTempDocHeaders.WizFileID, tTempDocHeaders.Number FROM (tTempDocHeaders Inner Join tDocTypes On tDocTypes.DocType = tTempDocHeaders.DocType) ORDER BY tTempDocHeaders.DocType, tTempDocHeaders.Reference1, tTempDocHeaders.DocDate"},
     {"qSelectDocLines",
-     "SELECT tTempDocLines.LineNum, tTempDocLines.ItemKey, tItems.ItemName, "
-     "tTempDocLines.Quantity, "
-     "tTempDocLines.Warehouse, tTempDocLines.Copies, tTempDocLines.Include FROM (tTempDocLines "
-     "Inner Join tItems "
-     "On tItems.ItemKey = tTempDocLines.ItemKey) ORDER BY tTempDocLines.HeadNumber, "
-     "tTempDocLines.LineNum"},
+     "SELECT tTempDocLines.LineNum, tTempDocLines.ItemKey, tItems.ItemName, tTempDocLines.Quantity, tTempDocLines.Warehouse, tTempDocLines.Copies, tTempDocLines.Include FROM (tTempDocLines Inner Join tItems On tItems.ItemKey = tTempDocLines.ItemKey) ORDER BY tTempDocLines.HeadNumber, tTempDocLines.LineNum"},
 };
 
 const TableDef& items() {
@@ -146,12 +134,9 @@ const TableDef& priceList() {
 
 const SavedQuery kItemQueries[3] = {
     {"qSelectItems",
-     "SELECT ItemKey, ItemName, Copies, PrintLabel FROM tItems ORDER BY tItems.PrintLabel, "
-     "tItems.Itemkey"},
+     "SELECT ItemKey, ItemName, Copies, PrintLabel FROM tItems ORDER BY tItems.PrintLabel, tItems.Itemkey"},
     {"qSelectMarkedItems",
-     "SELECT ItemKey, ItemName, Copies, PrintLabel FROM tItems Where PrintLabel = True ORDER BY "
-     "tItems.PrintLabel, "
-     "tItems.Itemkey"},
+     "SELECT ItemKey, ItemName, Copies, PrintLabel FROM tItems Where PrintLabel = True ORDER BY tItems.PrintLabel, tItems.Itemkey"},
     {"qEditItems",
      "SELECT ItemKey, ItemName, Unit, BarCode, Price FROM tItems ORDER BY tItems.Itemkey"},
 };
@@ -177,26 +162,11 @@ const char* const kTempItemLinks[4] = {"tItems", "tAlterKeys", "tAlterPrices", "
 
 const SavedQuery kTempItemQueries[3] = {
     {"qAddUpdateAlterKeys",
-     "UPDATE tTempAlterKeys LEFT JOIN tAlterKeys ON (tTempAlterKeys.AccountKey = "
-     "tAlterKeys.AccountKey) AND "
-     "(tTempAlterKeys.ItemKey = tAlterKeys.ItemKey) SET tAlterKeys.AccountKey = "
-     "tTempAlterKeys.AccountKey, "
-     "tAlterKeys.ItemKey = tTempAlterKeys.ItemKey, tAlterKeys.AlterNum = tTempAlterKeys.AlterNum"},
+     "UPDATE tTempAlterKeys LEFT JOIN tAlterKeys ON (tTempAlterKeys.AccountKey = tAlterKeys.AccountKey) AND (tTempAlterKeys.ItemKey = tAlterKeys.ItemKey) SET tAlterKeys.AccountKey = tTempAlterKeys.AccountKey, tAlterKeys.ItemKey = tTempAlterKeys.ItemKey, tAlterKeys.AlterNum = tTempAlterKeys.AlterNum"},
     {"qAddUpdateAlterPrices",
-     "UPDATE tTempAlterPrices LEFT JOIN tAlterPrices ON (tTempAlterPrices.AccountKey = "
-     "tAlterPrices.AccountKey) AND "
-     "(tTempAlterPrices.ItemKey = tAlterPrices.ItemKey) SET tAlterPrices.AccountKey = "
-     "tTempAlterPrices.AccountKey, "
-     "tAlterPrices.ItemKey = tTempAlterPrices.ItemKey, tAlterPrices.Price = "
-     "tTempAlterPrices.Price, "
-     "tAlterPrices.Coin = tTempAlterPrices.Coin"},
+     "UPDATE tTempAlterPrices LEFT JOIN tAlterPrices ON (tTempAlterPrices.AccountKey = tAlterPrices.AccountKey) AND (tTempAlterPrices.ItemKey = tAlterPrices.ItemKey) SET tAlterPrices.AccountKey = tTempAlterPrices.AccountKey, tAlterPrices.ItemKey = tTempAlterPrices.ItemKey, tAlterPrices.Price = tTempAlterPrices.Price, tAlterPrices.Coin = tTempAlterPrices.Coin"},
     {"qAddUpdatePriceList",
-     "UPDATE tTempPriceList LEFT JOIN tPriceList ON (tTempPriceList.ItemKey = tPriceList.ItemKey) "
-     "AND "
-     "(tTempPriceList.PriceList = tPriceList.PriceList) SET tPriceList.ItemKey = "
-     "tTempPriceList.ItemKey, "
-     "tPriceList.PriceList = tTempPriceList.PriceList, tPriceList.Price = tTempPriceList.Price, "
-     "tPriceList.Currency = tTempPriceList.Currency"},
+     "UPDATE tTempPriceList LEFT JOIN tPriceList ON (tTempPriceList.ItemKey = tPriceList.ItemKey) AND (tTempPriceList.PriceList = tPriceList.PriceList) SET tPriceList.ItemKey = tTempPriceList.ItemKey, tPriceList.PriceList = tTempPriceList.PriceList, tPriceList.Price = tTempPriceList.Price, tPriceList.Currency = tTempPriceList.Currency"},
 };
 
 const TableDef& stockLog() {

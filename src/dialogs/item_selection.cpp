@@ -1,10 +1,10 @@
 #include "dialogs/item_selection.h"
 
 #include "db/file_names.h"
+#include "dialogs/bound_grid_model.h"
 #include "dialogs/items_query.h"
 #include "jet/error.h"
 #include "jet/vb.h"
-#include "dialogs/bound_grid_model.h"
 
 namespace etq {
 

@@ -9,10 +9,10 @@
 #include <QTableView>
 
 #include "dialogs/bound_grid_model.h"
+#include "dialogs/language_switch.h"
 #include "platform/captions.h"
 #include "platform/failure.h"
 #include "platform/log.h"
-#include "dialogs/language_switch.h"
 
 namespace etq {
 

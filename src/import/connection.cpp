@@ -2,9 +2,9 @@
 
 #include <QFileInfo>
 
+#include "platform/settings_keys.h"
 #include "platform/settings_store.h"
 #include "platform/user_paths.h"
-#include "platform/settings_keys.h"
 
 namespace etq {
 

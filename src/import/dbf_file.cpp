@@ -66,13 +66,14 @@ void DbfFile::readHeader(qint64 fileSize) {
     if (recordLength_ == 0) fail(QStringLiteral("the record length is 0"));
     const qint64 needed = headerLength_ + recordCount_ * recordLength_;
     if (fileSize < needed)
-        fail(QStringLiteral("the header announces %1 records of %2 bytes after %3 header bytes, "
-                            "%4 bytes in all, but the file has only %5 bytes")
-                 .arg(recordCount_)
-                 .arg(recordLength_)
-                 .arg(headerLength_)
-                 .arg(needed)
-                 .arg(fileSize));
+        fail(
+            QStringLiteral(
+                "the header announces %1 records of %2 bytes after %3 header bytes, %4 bytes in all, but the file has only %5 bytes")
+                .arg(recordCount_)
+                .arg(recordLength_)
+                .arg(headerLength_)
+                .arg(needed)
+                .arg(fileSize));
 }
 
 void DbfFile::readFieldDescriptors() {
@@ -109,14 +110,15 @@ void DbfFile::requireRecordLength(int length, const QString& what) const {
 }
 
 void DbfFile::failAccess(qint64 record, int offset, int width) const {
-    throw DbfError(QStringLiteral("%1: cannot read %2 bytes at offset %3 of record %4: the file "
-                                  "has %5 records of %6 bytes")
-                       .arg(path_)
-                       .arg(width)
-                       .arg(offset)
-                       .arg(record)
-                       .arg(recordCount_)
-                       .arg(recordLength_));
+    throw DbfError(
+        QStringLiteral(
+            "%1: cannot read %2 bytes at offset %3 of record %4: the file has %5 records of %6 bytes")
+            .arg(path_)
+            .arg(width)
+            .arg(offset)
+            .arg(record)
+            .arg(recordCount_)
+            .arg(recordLength_));
 }
 
 QByteArrayView DbfFile::record(qint64 record) const {

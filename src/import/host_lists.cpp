@@ -24,10 +24,8 @@ struct ListFile {
 const ListFile& fileOf(HostList list) {
     static const ListFile kPropertyGroups{host::oitg::kLayout, host::oitg::kNumber,
                                           host::oitg::kName};
-    static const ListFile kItemGroups{host::oitb::kLayout, host::oitb::kNumber,
-                                      host::oitb::kName};
-    static const ListFile kPriceLists{host::opln::kLayout, host::opln::kNumber,
-                                      host::opln::kName};
+    static const ListFile kItemGroups{host::oitb::kLayout, host::oitb::kNumber, host::oitb::kName};
+    static const ListFile kPriceLists{host::opln::kLayout, host::opln::kNumber, host::opln::kName};
     switch (list) {
         case HostList::PropertyGroups:
             return kPropertyGroups;
@@ -48,10 +46,9 @@ QString existingHostFile(const QString& companyFolder, const host::HostLayout& l
 
 // Runs a reader of a small reference file over the database at dbPath, in one transaction.
 // The database failing is told on the command line only: the window has always passed over it.
-void readReferenceFile(
-    const QString& compPath, const QString& dbPath, const host::HostLayout& layout,
-    Progress& progress,
-    const std::function<void(jet::Database&, const DbfFile&, Progress&)>& read) {
+void readReferenceFile(const QString& compPath, const QString& dbPath,
+                       const host::HostLayout& layout, Progress& progress,
+                       const std::function<void(jet::Database&, const DbfFile&, Progress&)>& read) {
     progress.clear();
     const QString path = existingHostFile(compPath, layout);
     try {
@@ -61,7 +58,8 @@ void readReferenceFile(
         read(db, file, progress);
         writes.commit();
     } catch (const jet::JetError& e) {
-        throw QuietFailure(QStringLiteral("Reading %1 into %2: %3").arg(path, dbPath, e.description()));
+        throw QuietFailure(
+            QStringLiteral("Reading %1 into %2: %3").arg(path, dbPath, e.description()));
     }
     progress.clear();
 }
@@ -70,7 +68,8 @@ void readReferenceFile(
 
 EntryList readHostList(const QString& companyFolder, HostList list) {
     const ListFile& source = fileOf(list);
-    const DbfFile file = openHostFile(existingHostFile(companyFolder, source.layout), source.layout);
+    const DbfFile file =
+        openHostFile(existingHostFile(companyFolder, source.layout), source.layout);
     EntryList entries;
     forEachRecord(file, [&](qint64 record) {
         const QString name = file.text(record, source.name);

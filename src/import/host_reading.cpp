@@ -22,8 +22,8 @@ Whole wholeNumber(const DbfFile& file, qint64 record, const host::HostField& fie
     const QString text = file.text(record, field);
     if (const std::optional<Whole> value = convert(text)) return *value;
     throw HostValueError(
-        QStringLiteral("%1, record %2: the field %3 holds \"%4\", which is not a whole number "
-                       "from %5 to %6")
+        QStringLiteral(
+            "%1, record %2: the field %3 holds \"%4\", which is not a whole number from %5 to %6")
             .arg(file.path())
             .arg(record + 1)
             .arg(latin1(field.name), text)

@@ -74,9 +74,7 @@ Price priceEntry(const DbfFile& file, qint64 record, int n) {
 class ItemImport {
   public:
     ItemImport(jet::Database& db, const ItemReadOptions& options)
-        : options_(options),
-          items_(db.openRecordset(QStringLiteral("tItems"))),
-          fields_(items_) {
+        : options_(options), items_(db.openRecordset(QStringLiteral("tItems"))), fields_(items_) {
         if (!items_.eof()) items_.moveFirst();
         if (options_.stagePriceLists) {
             priceLists_ = db.openRecordset(QStringLiteral("tTempPriceList"));

@@ -28,9 +28,9 @@ struct ItemReadOptions {
     QString toKey;
     std::optional<qint16> group;  // only items of this item group (a blank group passes)
     std::optional<QueryGroupRule> queryGroup;
-    bool foreignNames = false;  // ItemName from the foreign name
-    qint16 copies = 0;          // Copies of every item read
-    int priceField = 1;         // the price entry (1..10) that gives Price and Coin
+    bool foreignNames = false;     // ItemName from the foreign name
+    qint16 copies = 0;             // Copies of every item read
+    int priceField = 1;            // the price entry (1..10) that gives Price and Coin
     bool stagePriceLists = false;  // also stage all ten prices in tTempPriceList
 };
 

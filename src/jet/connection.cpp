@@ -185,10 +185,11 @@ namespace {
     const QString field = m.captured(1);
     const QString rule = m.captured(2);
     if (rule == "too long")
-        fail(err::kTooLong,
-             QString("The field is too small to accept the amount of data you attempted to add "
-                     "(field '%1').")
-                 .arg(field));
+        fail(
+            err::kTooLong,
+            QString(
+                "The field is too small to accept the amount of data you attempted to add (field '%1').")
+                .arg(field));
     if (rule == "empty")
         fail(err::kZeroLength, QString("Field '%1' cannot be a zero-length string.").arg(field));
     if (rule == "range")
@@ -206,14 +207,9 @@ void Connection::raise(int rc, const QString& context) const {
     switch (rc) {
         case SQLITE_CONSTRAINT_PRIMARYKEY:
         case SQLITE_CONSTRAINT_UNIQUE:
-            fail(err::kDuplicateKey,
-                 "The changes you requested to the table were not successful because they would "
-                 "create "
-                 "duplicate values in the index, primary key, or relationship. Change the data in "
-                 "the field "
-                 "or fields that contain duplicate data, remove the index, or redefine the index "
-                 "to permit "
-                 "duplicate entries and try again.");
+            fail(
+                err::kDuplicateKey,
+                "The changes you requested to the table were not successful because they would create duplicate values in the index, primary key, or relationship. Change the data in the field or fields that contain duplicate data, remove the index, or redefine the index to permit duplicate entries and try again.");
         case SQLITE_CONSTRAINT_NOTNULL:
             fail(err::kNullKey, "Index or primary key cannot contain a Null value.");
         case SQLITE_CONSTRAINT_CHECK:
@@ -248,10 +244,11 @@ void Connection::raise(int rc, const QString& context) const {
         if (it != broken_.constEnd())
             fail(err::kFileNotFound,
                  QString("Could not find file '%1' (linked table '%2').").arg(it.value(), table));
-        fail(err::kTableNotFound, QString("The database engine cannot find the input table or "
-                                          "query '%1'. Make sure it exists and "
-                                          "that its name is spelled correctly.")
-                                      .arg(table));
+        fail(
+            err::kTableNotFound,
+            QString(
+                "The database engine cannot find the input table or query '%1'. Make sure it exists and that its name is spelled correctly.")
+                .arg(table));
     }
     if (const auto m = noColumn.match(message); m.hasMatch())
         fail(err::kUnknownField,
@@ -327,8 +324,8 @@ const TableDef* Connection::findTableDef(const QString& name) {
         const QString schema = schemas.column(1).toString();
         if (schema == "temp") continue;
         Stmt find = prepare(
-            QString("SELECT name FROM \"%1\".sqlite_master WHERE type = 'table' AND name = ?1 "
-                    "COLLATE NOCASE")
+            QString(
+                "SELECT name FROM \"%1\".sqlite_master WHERE type = 'table' AND name = ?1 COLLATE NOCASE")
                 .arg(schema),
             false);
         find.bind(1, name);
@@ -451,8 +448,7 @@ QVariant toStored(const QVariant& value, const FieldDef& def, const QString& tab
                 fail(
                     err::kTooLong,
                     QString(
-                        "The field is too small to accept the amount of data you attempted to add: "
-                        "field '%1.%2' holds %3 characters, the value has %4.")
+                        "The field is too small to accept the amount of data you attempted to add: field '%1.%2' holds %3 characters, the value has %4.")
                         .arg(table, def.name)
                         .arg(def.size)
                         .arg(text.size()));

@@ -23,8 +23,7 @@ constexpr int kApplicationId = 0x45545131;  // "ETQ1"
 // The catalog tables: what the file records besides the user's tables.
 const char* const kCatalog[] = {
     "CREATE TABLE MSysInfo (Name TEXT NOT NULL PRIMARY KEY, Value TEXT)",
-    "CREATE TABLE MSysLinks (Name TEXT NOT NULL COLLATE NOCASE PRIMARY KEY, Connect TEXT NOT NULL, "
-    "SourceTable TEXT NOT NULL)",
+    "CREATE TABLE MSysLinks (Name TEXT NOT NULL COLLATE NOCASE PRIMARY KEY, Connect TEXT NOT NULL, SourceTable TEXT NOT NULL)",
     "CREATE TABLE MSysQueries (Name TEXT NOT NULL COLLATE NOCASE PRIMARY KEY, SQL TEXT NOT NULL)",
 };
 
@@ -223,8 +222,7 @@ TableDef Database::tableDef(const QString& name) const {
 
 bool Database::hasTable(const QString& name) const {
     Stmt s = connection().prepare(
-        "SELECT 1 FROM main.sqlite_master WHERE type = 'table' AND name = ?1 COLLATE NOCASE "
-        "UNION ALL SELECT 1 FROM main.MSysLinks WHERE Name = ?1");
+        "SELECT 1 FROM main.sqlite_master WHERE type = 'table' AND name = ?1 COLLATE NOCASE UNION ALL SELECT 1 FROM main.MSysLinks WHERE Name = ?1");
     s.bind(1, name);
     return s.step();
 }
@@ -232,8 +230,7 @@ bool Database::hasTable(const QString& name) const {
 QStringList Database::tableNames() const {
     QStringList names;
     Stmt s = connection().prepare(
-        "SELECT name FROM main.sqlite_master WHERE type = 'table' AND name NOT LIKE 'MSys%' "
-        "AND name NOT LIKE 'sqlite%' ORDER BY rowid");
+        "SELECT name FROM main.sqlite_master WHERE type = 'table' AND name NOT LIKE 'MSys%' AND name NOT LIKE 'sqlite%' ORDER BY rowid");
     while (s.step())
         names << s.column(0).toString();
     for (const LinkDef& link : links())
@@ -251,10 +248,11 @@ void Database::linkTable(const QString& name, const QString& sourcePath,
     if (!QFileInfo::exists(sourcePath))
         fail(err::kFileNotFound, QString("Could not find file '%1'.").arg(sourcePath));
     const QString alias = connection().attach(sourcePath);
-    Stmt find = conn_->prepare(QString("SELECT name FROM \"%1\".sqlite_master WHERE type = 'table' "
-                                       "AND name = ?1 COLLATE NOCASE")
-                                   .arg(alias),
-                               false);
+    Stmt find = conn_->prepare(
+        QString(
+            "SELECT name FROM \"%1\".sqlite_master WHERE type = 'table' AND name = ?1 COLLATE NOCASE")
+            .arg(alias),
+        false);
     find.bind(1, source);
     if (!find.step())
         fail(err::kTableNotFound,

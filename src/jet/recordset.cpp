@@ -221,32 +221,35 @@ QString Recordset::Impl::buildInsertSql(int base) const {
         .arg(table, names.join(", "), marks.join(", "));
 }
 
+QString Recordset::Impl::writeSql(QHash<quint64, QString>& kept, bool keep, int base,
+                                  QString (Impl::*build)(int) const) const {
+    if (!keep || columns.size() > 64) return (this->*build)(base);
+    const quint64 mask = changedMask();
+    auto it = kept.find(mask);
+    if (it == kept.end()) it = kept.insert(mask, (this->*build)(base));
+    return it.value();
+}
+
+int Recordset::Impl::bindChanged(Stmt& statement, int base) const {
+    int k = 0;
+    for (int i = 0; i < columns.size(); ++i)
+        if (changed[size_t(i)] && columns[i].base == base) statement.bind(++k, buffer[i]);
+    return k;
+}
+
 void Recordset::Impl::writeEdit() {
     std::set<int> touched;
     for (int i = 0; i < columns.size(); ++i)
         if (changed[size_t(i)]) touched.insert(columns[i].base);
-    // A table recordset has one base; its statements are kept by the columns they write.
-    const bool cacheable = tableMode && columns.size() <= 64;
     for (const int b : touched) {
         const qint64 rowid = rowidOf(pos, b);
         if (rowid < 0)
             fail(
                 err::kFieldNotUpdatable,
                 QString("Field can't be updated: the row of '%1' is missing.").arg(bases[b].table));
-        QString sql;
-        if (cacheable) {
-            const quint64 mask = changedMask();
-            auto it = updateSql.find(mask);
-            if (it == updateSql.end()) it = updateSql.insert(mask, buildUpdateSql(b));
-            sql = it.value();
-        } else {
-            sql = buildUpdateSql(b);
-        }
-        Stmt s = conn->prepare(sql);
-        int k = 0;
-        for (int i = 0; i < columns.size(); ++i)
-            if (changed[size_t(i)] && columns[i].base == b) s.bind(++k, buffer[i]);
-        s.bind(k + 1, rowid);
+        // A table recordset has one base, so the changed columns tell its statement.
+        Stmt s = conn->prepare(writeSql(updateSql, tableMode, b, &Impl::buildUpdateSql));
+        s.bind(bindChanged(s, b) + 1, rowid);
         s.step();
     }
     if (tableMode) {
@@ -266,19 +269,8 @@ void Recordset::Impl::writeNew() {
     if (touched.size() != 1)
         fail(err::kReadOnly, "Cannot add the record: its fields belong to more than one table.");
     const int b = *touched.begin();
-    QString sql;
-    if (columns.size() <= 64) {
-        const quint64 mask = changedMask();
-        auto it = insertSql.find(mask);
-        if (it == insertSql.end()) it = insertSql.insert(mask, buildInsertSql(b));
-        sql = it.value();
-    } else {
-        sql = buildInsertSql(b);
-    }
-    Stmt s = conn->prepare(sql);
-    int k = 0;
-    for (int i = 0; i < columns.size(); ++i)
-        if (changed[size_t(i)] && columns[i].base == b) s.bind(++k, buffer[i]);
+    Stmt s = conn->prepare(writeSql(insertSql, true, b, &Impl::buildInsertSql));
+    bindChanged(s, b);
     s.step();
     const qint64 rowid = sqlite3_last_insert_rowid(conn->db());
     // The new row joins the end of the recordset; the current row stays current.

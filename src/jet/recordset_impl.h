@@ -53,6 +53,12 @@ struct Recordset::Impl {
     quint64 changedMask() const;
     QString buildUpdateSql(int base) const;
     QString buildInsertSql(int base) const;
+    // The statement `build` makes for base `base`, kept in `kept` by the set of changed columns
+    // when `keep` allows it (a mask of 64 bits tells the sets of at most 64 columns apart).
+    QString writeSql(QHash<quint64, QString>& kept, bool keep, int base,
+                     QString (Impl::*build)(int) const) const;
+    // Binds the changed values of base `base` from ?1 on; the number of values bound.
+    int bindChanged(detail::Stmt& statement, int base) const;
 
     // Table recordsets: the rowids in order, and the current row once it has been read.
     std::vector<qint64> keys;

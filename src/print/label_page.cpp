@@ -8,12 +8,12 @@
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "jet/vb.h"
+#include "platform/label_fields.h"
 #include "platform/page_file.h"
-#include "platform/progress.h"
 #include "platform/print_folder.h"
+#include "platform/progress.h"
 #include "platform/user_paths.h"
 #include "print/barcode_images.h"
-#include "platform/label_fields.h"
 #include "print/label_query.h"
 
 namespace etq {
@@ -82,11 +82,10 @@ void writeHead(PageFile& page, const LabelDefinition& def) {
     page.writeLine(u"       TR {vertical-align: middle; }");
     page.writeLine(u"       TD {vertical-align: middle; }");
     page.writeLine(
-        u"       TABLE {border: none; direction: rtl; padding: 0; word-spacing: 0; "
-        u"letter-spacing: 0}");
+        u"       TABLE {border: none; direction: rtl; padding: 0; word-spacing: 0; letter-spacing: 0}");
     page.writeLine(
-        QStringLiteral("       .Lab {border: none; direction: rtl; padding: 1; word-spacing: 0; "
-                       "letter-spacing: 0; margin-top: ") +
+        QStringLiteral(
+            "       .Lab {border: none; direction: rtl; padding: 1; word-spacing: 0; letter-spacing: 0; margin-top: ") +
         QString::number(def.page.LabTop) + QStringLiteral("; margin-bottom: ") +
         QString::number(def.page.LabBottom) + u'}');
     page.writeLine(u"</style>");
@@ -283,8 +282,8 @@ void writeLabelPage(const QString& fileName, const QString& dbName, LabelPageInp
     progress.clear();
 }
 
-BuiltInPrint printBuiltInLabels(const QString& dbName, LabelPageInput& input,
-                                LabelDefinition& def, Progress& progress) {
+BuiltInPrint printBuiltInLabels(const QString& dbName, LabelPageInput& input, LabelDefinition& def,
+                                Progress& progress) {
     // Built before the page ticks the cells' fields, as the page's own query is later.
     const QString sql = BuildLabelQuery(input.query);
     const QString folder = printFolder();

@@ -24,32 +24,21 @@ constexpr SlotPiece kSlotPieces[] = {
      u", tTempDocHeaders.AccountKey As CardCode"},
     {10, u", 'NoRef' AS Reference1", u"", u", tTempDocHeaders.Reference1"},
     {12,
-     u", (Select AlterNum From tAlterKeys Where AccountKey = {key}"
-     u" And ItemKey = tItems.ItemKey) AS AlterKey",
+     u", (Select AlterNum From tAlterKeys Where AccountKey = {key} And ItemKey = tItems.ItemKey) AS AlterKey",
      u", tItems.ItemKey As AlterKey",
-     u", (Select AlterNum From tAlterKeys Where AccountKey = tTempDocHeaders.AccountKey"
-     u" And ItemKey = tItems.ItemKey) AS AlterKey"},
+     u", (Select AlterNum From tAlterKeys Where AccountKey = tTempDocHeaders.AccountKey And ItemKey = tItems.ItemKey) AS AlterKey"},
     {11,
-     u", (Select Price From tAlterPrices Where AccountKey = {key}"
-     u" And ItemKey = tItems.ItemKey) AS SpecialPrice",
+     u", (Select Price From tAlterPrices Where AccountKey = {key} And ItemKey = tItems.ItemKey) AS SpecialPrice",
      u", tItems.Price AS SpecialPrice",
-     u", (Select Price From tAlterPrices Where AccountKey = tTempDocHeaders.AccountKey"
-     u" And ItemKey = tItems.ItemKey) AS SpecialPrice"},
+     u", (Select Price From tAlterPrices Where AccountKey = tTempDocHeaders.AccountKey And ItemKey = tItems.ItemKey) AS SpecialPrice"},
     {13,
-     u", (Select AlterBar From tAlterKeys Where AccountKey = {key}"
-     u" And ItemKey = tItems.ItemKey) AS AlterBar",
+     u", (Select AlterBar From tAlterKeys Where AccountKey = {key} And ItemKey = tItems.ItemKey) AS AlterBar",
      u", tItems.BarCode AS AlterBar",
-     u", (Select AlterBar From tAlterKeys Where AccountKey = tTempDocHeaders.AccountKey"
-     u" And ItemKey = tItems.ItemKey) AS AlterBar"},
+     u", (Select AlterBar From tAlterKeys Where AccountKey = tTempDocHeaders.AccountKey And ItemKey = tItems.ItemKey) AS AlterBar"},
     {14,
-     u", (Select Price From tAccountDef, tPriceList Where tAccountDef.AccountKey = {key}"
-     u" And tPriceList.ItemKey = tItems.ItemKey"
-     u" And tPriceList.PriceList = tAccountDef.PriceList) As ListPrice",
+     u", (Select Price From tAccountDef, tPriceList Where tAccountDef.AccountKey = {key} And tPriceList.ItemKey = tItems.ItemKey And tPriceList.PriceList = tAccountDef.PriceList) As ListPrice",
      u", tItems.Price AS ListPrice",
-     u", (Select Price From tAccountDef, tPriceList"
-     u" Where tAccountDef.AccountKey = tTempDocHeaders.AccountKey"
-     u" And tPriceList.ItemKey = tTempDocLines.ItemKey"
-     u" And tPriceList.PriceList = tAccountDef.PriceList) As ListPrice"},
+     u", (Select Price From tAccountDef, tPriceList Where tAccountDef.AccountKey = tTempDocHeaders.AccountKey And tPriceList.ItemKey = tTempDocLines.ItemKey And tPriceList.PriceList = tAccountDef.PriceList) As ListPrice"},
     {15, u", {key} As CardName", u", 'NoName' AS CardName", u", tTempDocHeaders.CardName"},
     {16, u", 'NoBlock' AS BlockNum", u"", u", tTempDocLines.BlockNum"},
     {17, u", 'NoStamp' AS StampNum", u"", u", tTempDocHeaders.StampNum"},
@@ -62,8 +51,7 @@ constexpr SlotPiece kSlotPieces[] = {
     {24, u", 'NoContact' AS CntctTel1", u"", u", tTempDocHeaders.CntctTel1"},
     {25, u", 'NoContact' AS CntctNotes1", u"", u", tTempDocHeaders.CntctNotes1"},
     {26, u", 'NoSymbol' AS SymbolHeb", u"",
-     u", (Select SymbolHeb From tWizFiles Where WizFileID = tTempDocHeaders.WizFileID)"
-     u" AS SymbolHeb"},
+     u", (Select SymbolHeb From tWizFiles Where WizFileID = tTempDocHeaders.WizFileID) AS SymbolHeb"},
     {28, u", 'NoDueDate' AS DocDueDate", u"", u", tTempDocHeaders.DocDueDate"},
     {29, u", '0' AS Comments", u"", u", tTempDocHeaders.Comments"},
     {30, u", tItems.SuppCatNum", u"", u""},
@@ -81,9 +69,7 @@ constexpr SlotPiece kSlotPieces[] = {
 };
 
 constexpr QStringView kHead =
-    u"SELECT tItems.ItemKey, tItems.ItemName, tItems.ItemSort, tItems.FName"
-    u", tItems.BarCode, tItems.Local, tItems.Unit, tItems.Price"
-    u", tItems.Coin, tCurrencies.WizSign AS CoinSign";
+    u"SELECT tItems.ItemKey, tItems.ItemName, tItems.ItemSort, tItems.FName, tItems.BarCode, tItems.Local, tItems.Unit, tItems.Price, tItems.Coin, tCurrencies.WizSign AS CoinSign";
 constexpr QStringView kFrom =
     u" FROM (tCurrencies INNER JOIN tItems ON tCurrencies.Currency = tItems.Coin)";
 
@@ -123,14 +109,12 @@ QString BuildLabelQuery(const LabelQueryInput& in) {
 
     if (documents) {
         sql += QStringLiteral(
-            ", tTempDocHeaders.WizFileID, tTempDocHeaders.Number, tTempDocLines.Copies"
-            ", (Select LabelName From tAccountDef"
-            " Where tAccountDef.AccountKey = tTempDocHeaders.AccountKey) As AccountLabel");
+            ", tTempDocHeaders.WizFileID, tTempDocHeaders.Number, tTempDocLines.Copies, (Select LabelName From tAccountDef Where tAccountDef.AccountKey = tTempDocHeaders.AccountKey) As AccountLabel");
     } else if (accountMode) {
-        sql += QStringLiteral(
-                   ", tItems.Copies, (Select LabelName From tAccountDef"
-                   " Where tAccountDef.AccountKey = ") +
-               key + QStringLiteral(") As AccountLabel");
+        sql +=
+            QStringLiteral(
+                ", tItems.Copies, (Select LabelName From tAccountDef Where tAccountDef.AccountKey = ") +
+            key + QStringLiteral(") As AccountLabel");
     } else {
         sql += QStringLiteral(", tItems.Copies, '' As AccountLabel");
     }
@@ -149,10 +133,7 @@ QString BuildLabelQuery(const LabelQueryInput& in) {
     const QString direction = directionWord(in.order);
     if (documents) {
         sql += QStringLiteral(
-            " And tTempDocLines.WizFileID = tTempDocHeaders.WizFileID"
-            " And tTempDocLines.HeadNumber = tTempDocHeaders.Number"
-            " And tItems.Itemkey = tTempDocLines.Itemkey"
-            " And (tTempDocHeaders.Include = True) And (tTempDocLines.Include = True)");
+            " And tTempDocLines.WizFileID = tTempDocHeaders.WizFileID And tTempDocLines.HeadNumber = tTempDocHeaders.Number And tItems.Itemkey = tTempDocLines.Itemkey And (tTempDocHeaders.Include = True) And (tTempDocLines.Include = True)");
         sql += QStringLiteral(" ORDER BY tTempDocLines.WizFileID ") + direction +
                QStringLiteral(", tTempDocLines.HeadNumber ") + direction +
                QStringLiteral(", tTempDocLines.LineNum ") + direction;

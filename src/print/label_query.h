@@ -21,7 +21,7 @@ struct LabelQueryInput {
     QString accountKey;
     QString fromItem;  // item labels only
     QString toItem;
-    std::array<bool, kLabelFieldCount> fieldChecks{};  // ChkFldSend(i) has value 1
+    std::array<bool, kLabelFieldCount> fieldChecks{};  // the field slots that are sent
     QString companyName;
 };
 

@@ -6,7 +6,7 @@ namespace etq {
 
 class FileChooser;
 
-// The label software kinds, as the option array OptOLE chooses them.
+// The label software kinds: the print routes the user chooses among.
 inline constexpr qint16 kNoLabelSoftware = 0;
 inline constexpr qint16 kCodeSoft = 2;
 inline constexpr qint16 kBarTender = 4;

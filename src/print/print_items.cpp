@@ -17,9 +17,10 @@ QString prepareItemPrint(const ItemPrintOptions& options) {
         db::CreateDocDatabase(db::inFolder(folder, db::kDocDatabaseFile),
                               db::inFolder(folder, db::kItemDatabaseFile), workDb, {});
     if (options.kind != kBuiltInPage)
-        throw Failure(QStringLiteral("No label software can be driven on this system (kind %1): "
-                                     "choose \"Direct\" to print on the built-in label page")
-                          .arg(options.kind));
+        throw Failure(
+            QStringLiteral(
+                "No label software can be driven on this system (kind %1): choose \"Direct\" to print on the built-in label page")
+                .arg(options.kind));
     QString error;
     if (options.printer && !setDefaultPrinter(*options.printer, &error)) throw Failure(error);
     return workDb;

@@ -23,8 +23,7 @@ void moveKey(const Surface& surface, SettingsStore& store, quint8 action, const 
 
 }  // namespace
 
-void GetSetParams(const Surface& surface, const QString& application, quint8 group,
-                  quint8 action) {
+void GetSetParams(const Surface& surface, const QString& application, quint8 group, quint8 action) {
     if (!isGroup(group)) return;
     SettingsStore store(application);
     for (const SettingKey& entry : settingKeys()) {

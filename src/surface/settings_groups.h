@@ -14,8 +14,7 @@ enum SettingsAction : quint8 { SaveSettings = 1, LoadSettings = 2 };
 // Saves (action 1) or loads (action 2) a settings group between the store of the application
 // name and the surface's controls. A key whose control is missing or cannot take
 // the value is skipped; the next key goes on.
-void GetSetParams(const Surface& surface, const QString& application, quint8 group,
-                  quint8 action);
+void GetSetParams(const Surface& surface, const QString& application, quint8 group, quint8 action);
 
 // Moves one value: action 1 writes the control's property of the kind as text, action 2
 // reads the stored value (or the default) into it. Other actions do nothing. Throws

@@ -6,16 +6,16 @@
 #include <QFile>
 #include <QTemporaryDir>
 
-#include "import/connection.h"
-#include "platform/settings_store.h"
-#include "platform/captions.h"
 #include "card/card_controller.h"
 #include "card/print_adapters.h"
+#include "card_test_support.h"
+#include "import/connection.h"
+#include "platform/captions.h"
 #include "platform/context.h"
+#include "platform/settings_store.h"
 #include "print/label_software.h"
 #include "surface/memory_surface.h"
 #include "surface/settings_groups.h"
-#include "card_test_support.h"
 
 namespace etq {
 namespace {

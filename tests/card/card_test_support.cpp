@@ -5,7 +5,6 @@
 #include <QtEndian>
 #include <stdexcept>
 
-
 namespace etq::test {
 
 void writeEmptyDbf(const QString& path, const QByteArray& fieldName, int fieldLength) {

@@ -4,11 +4,11 @@
 #include <QFile>
 #include <QProcess>
 
+#include "card_test_support.h"
 #include "platform/settings_store.h"
 #include "platform/user_paths.h"
 #include "surface/memory_surface.h"
 #include "surface/settings_groups.h"
-#include "card_test_support.h"
 
 namespace etq {
 namespace {

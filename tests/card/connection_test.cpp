@@ -6,11 +6,11 @@
 #include <QPushButton>
 #include <QTemporaryDir>
 
+#include "card_test_support.h"
 #include "dialogs/logon_dialog.h"
 #include "import/connection.h"
 #include "platform/context.h"
 #include "platform/settings_store.h"
-#include "card_test_support.h"
 
 namespace etq {
 namespace {

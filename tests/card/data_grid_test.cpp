@@ -9,15 +9,15 @@
 #include <QTableView>
 #include <QTemporaryDir>
 
+#include "card/main_card.h"
+#include "card_test_support.h"
 #include "db/file_names.h"
 #include "db/local_databases.h"
+#include "dialogs/bound_grid_model.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
-#include "dialogs/bound_grid_model.h"
 #include "platform/captions.h"
-#include "card/main_card.h"
 #include "platform/context.h"
-#include "card_test_support.h"
 #include "support/qt_print.h"
 
 namespace etq {

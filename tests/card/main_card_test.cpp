@@ -14,12 +14,12 @@
 #include <QTest>
 
 #include "card/card_controller.h"
-#include "card/print_adapters.h"
-#include "platform/context.h"
-#include "dialogs/language_switch.h"
 #include "card/main_card.h"
-#include "surface/memory_surface.h"
+#include "card/print_adapters.h"
 #include "card_test_support.h"
+#include "dialogs/language_switch.h"
+#include "platform/context.h"
+#include "surface/memory_surface.h"
 
 namespace etq {
 namespace {
@@ -30,25 +30,17 @@ const struct {
     const char* names;
 } kTabControls[] = {
     {0,
-     "txtFromItem txtToItem LblToKey ChkUseAccountKey txtAccountKey cmdSelectItems Image3 "
-     "cmdPrintItmes Image5 cmdSaveDef4"},
+     "txtFromItem txtToItem LblToKey ChkUseAccountKey txtAccountKey cmdSelectItems Image3 cmdPrintItmes Image5 cmdSaveDef4"},
     {1,
-     "txtFromDate txtToDate LblFromDate LblToDate txtFromDocNum txtToDocNum LblToRef "
-     "chkReadDocItems chkPrintHeadLabel chkOnlyLine0 chkUseFastWay cmdImportDocs Image6 "
-     "cmdSelectDocItems Image7 cmdPrintDocButt Image8 cmdRanges cmdDLog cmdSaveDef5"},
+     "txtFromDate txtToDate LblFromDate LblToDate txtFromDocNum txtToDocNum LblToRef chkReadDocItems chkPrintHeadLabel chkOnlyLine0 chkUseFastWay cmdImportDocs Image6 cmdSelectDocItems Image7 cmdPrintDocButt Image8 cmdRanges cmdDLog cmdSaveDef5"},
     {2,
-     "txtFromItemKey txtToItemKey chkItmQGrp cmbItmQGrp cmbItmQGrpBy chkItmBelong cmbItmBelong "
-     "chkReadPriceList ChkClean ChkImportAlterPrices txtCopies cmbPriceField CmbItemNameType "
-     "CmdImportItems cmdSaveDef2"},
+     "txtFromItemKey txtToItemKey chkItmQGrp cmbItmQGrp cmbItmQGrpBy chkItmBelong cmbItmBelong chkReadPriceList ChkClean ChkImportAlterPrices txtCopies cmbPriceField CmbItemNameType CmdImportItems cmdSaveDef2"},
     {3, "cmbPrinter cmdAlterKeys cmdAccDef cmdEditItems"},
     {4,
-     "txtCompanyName txtDBPath DDEorOLE OptOLE(0) OptOLE(1) OptOLE(2) OptOLE(3) OptOLE(4) "
-     "PrinterType OptPrinter(0) OptPrinter(1) txtLabelSoftware CmdDir(2) txtLabelName CmdDir(1) "
-     "ImgEdit(1) txtLabelNameHead CmdDir(0) ImgEdit(0) cmdLabDesign CmdConnect cmdSaveDef1"},
+     "txtCompanyName txtDBPath DDEorOLE OptOLE(0) OptOLE(1) OptOLE(2) OptOLE(3) OptOLE(4) PrinterType OptPrinter(0) OptPrinter(1) txtLabelSoftware CmdDir(2) txtLabelName CmdDir(1) ImgEdit(1) txtLabelNameHead CmdDir(0) ImgEdit(0) cmdLabDesign CmdConnect cmdSaveDef1"},
     {5, "txtPrintDelay txtPriceFormat CmdSaveFields"},
     {6,
-     "VSDocTypes cmdAllDocTypes cmdNoDocTypes cmbAddressFrom cmbAddressSeperator cmbCopiesAt "
-     "cmbLine0From txtLine0Copies chkUseDeliverLog cmdSaveDef6"},
+     "VSDocTypes cmdAllDocTypes cmdNoDocTypes cmbAddressFrom cmbAddressSeperator cmbCopiesAt cmbLine0From txtLine0Copies chkUseDeliverLog cmdSaveDef6"},
     {7, "cmdUpgrade"},
     {-1, "MainTab Message1 ProgressFrame ProgressFill"},
 };

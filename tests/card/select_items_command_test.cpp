@@ -18,9 +18,7 @@ class SelectItemsCommandTest : public db::test::DbFolderTest {};
 TEST_F(SelectItemsCommandTest, ControlOpensItWithTheLabelTabsRange) {
     jet::Database items = jet::Database::open(path(db::kItemDatabaseFile));
     items.execute(
-        "INSERT INTO tItems (ItemKey, ItemName, Coin, Price, Copies, PrintLabel) VALUES "
-        "('100', 'סבון', '¦', 1, 1, False), ('200', 'מברשת', '¦', 1, 1, False), "
-        "('300', 'ספוג', '¦', 1, 1, False)");
+        "INSERT INTO tItems (ItemKey, ItemName, Coin, Price, Copies, PrintLabel) VALUES ('100', 'סבון', '¦', 1, 1, False), ('200', 'מברשת', '¦', 1, 1, False), ('300', 'ספוג', '¦', 1, 1, False)");
     Context context;
     MainCard card(context);
     card.control("txtDBPath").setText(dir.path());

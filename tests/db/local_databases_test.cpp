@@ -69,8 +69,7 @@ TEST_F(LocalDatabasesTest, AddAccountTablesTwiceFailsTheSecondTime) {
 TEST_F(LocalDatabasesTest, MarkedItemsListFirstByKey) {
     jet::Database items = jet::Database::open(path(kItemDatabaseFile));
     items.execute(
-        "INSERT INTO tItems (ItemKey, ItemName, PrintLabel, Copies) VALUES ('3', 'c', False, 1), "
-        "('1', 'a', False, 1), ('4', 'd', True, 2), ('2', 'b', True, 1)");
+        "INSERT INTO tItems (ItemKey, ItemName, PrintLabel, Copies) VALUES ('3', 'c', False, 1), ('1', 'a', False, 1), ('4', 'd', True, 2), ('2', 'b', True, 1)");
     EXPECT_EQ(rows(items, "qSelectItems"),
               QStringList({"2|b|1|True", "4|d|2|True", "1|a|1|False", "3|c|1|False"}));
     EXPECT_EQ(rows(items, "qSelectMarkedItems"), QStringList({"2|b|1|True", "4|d|2|True"}));
@@ -106,8 +105,7 @@ TEST_F(MergeTest, StagedPricesUpdateOrAddAndListElevenStays) {
     {
         jet::Database t = temp();
         t.execute(
-            "INSERT INTO tTempPriceList VALUES ('100', 2, 22, '$'), ('200', 10, 7, '¦'), ('200', "
-            "11, 8, '¦')");
+            "INSERT INTO tTempPriceList VALUES ('100', 2, 22, '$'), ('200', 10, 7, '¦'), ('200', 11, 8, '¦')");
         t.execute(
             "INSERT INTO tTempAlterPrices VALUES ('C1', '100', 6, '$'), ('C2', '200', 1.5, Null)");
         t.execute("INSERT INTO tTempAlterKeys VALUES ('C1', '100', 'A-2', Null)");
@@ -152,18 +150,14 @@ TEST_F(LocalDatabasesTest, TheStockShellShowsTablesTypesAndQueryTexts) {
     shell.start(
         "sqlite3",
         {path(kItemDatabaseFile),
-         "SELECT name FROM sqlite_master WHERE type = 'table' AND name LIKE 't%' ORDER BY rowid; "
-         "SELECT name || ' ' || type FROM pragma_table_info('tItems') WHERE cid IN (0, 2, 10, 15, "
-         "16); "
-         "SELECT SQL FROM MSysQueries WHERE Name = 'qSelectMarkedItems';"});
+         "SELECT name FROM sqlite_master WHERE type = 'table' AND name LIKE 't%' ORDER BY rowid; SELECT name || ' ' || type FROM pragma_table_info('tItems') WHERE cid IN (0, 2, 10, 15, 16); SELECT SQL FROM MSysQueries WHERE Name = 'qSelectMarkedItems';"});
     ASSERT_TRUE(shell.waitForFinished());
-    EXPECT_EQ(QString::fromUtf8(shell.readAllStandardOutput()).split('\n', Qt::SkipEmptyParts),
-              QStringList({"tItems", "tAlterKeys", "tAlterPrices", "tAccountDef", "tPriceList",
-                           "ItemKey TEXT(20)", "ItemSort SHORT", "Price DOUBLE", "Copies BYTE",
-                           "PrintLabel BIT",
-                           "SELECT ItemKey, ItemName, Copies, PrintLabel FROM tItems Where "
-                           "PrintLabel = True ORDER BY "
-                           "tItems.PrintLabel, tItems.Itemkey"}));
+    EXPECT_EQ(
+        QString::fromUtf8(shell.readAllStandardOutput()).split('\n', Qt::SkipEmptyParts),
+        QStringList(
+            {"tItems", "tAlterKeys", "tAlterPrices", "tAccountDef", "tPriceList",
+             "ItemKey TEXT(20)", "ItemSort SHORT", "Price DOUBLE", "Copies BYTE", "PrintLabel BIT",
+             "SELECT ItemKey, ItemName, Copies, PrintLabel FROM tItems Where PrintLabel = True ORDER BY tItems.PrintLabel, tItems.Itemkey"}));
 }
 
 TEST_F(LocalDatabasesTest, TheDeliveredDocumentDatabaseHoldsTypesFilesRangesAndTheLocalCurrency) {
@@ -172,12 +166,11 @@ TEST_F(LocalDatabasesTest, TheDeliveredDocumentDatabaseHoldsTypesFilesRangesAndT
     EXPECT_EQ(rows(doc, "Select DocType From tDocTypes Where Include Or IncludeDraft"),
               QStringList({"1", "2"}));
     // Every document type has its host file and a scan range starting at 0.
-    EXPECT_EQ(rows(doc,
-                   "SELECT Count(*) FROM (tDocTypes INNER JOIN tWizFiles ON tWizFiles.WizFileID = "
-                   "tDocTypes.DocType) INNER JOIN tWizFileRanges ON tWizFileRanges.WizFileID = "
-                   "tDocTypes.DocType "
-                   "WHERE tWizFileRanges.FromIndx = 0"),
-              rows(doc, "SELECT Count(*) FROM tDocTypes"));
+    EXPECT_EQ(
+        rows(
+            doc,
+            "SELECT Count(*) FROM (tDocTypes INNER JOIN tWizFiles ON tWizFiles.WizFileID = tDocTypes.DocType) INNER JOIN tWizFileRanges ON tWizFileRanges.WizFileID = tDocTypes.DocType WHERE tWizFileRanges.FromIndx = 0"),
+        rows(doc, "SELECT Count(*) FROM tDocTypes"));
     QStringList docTypes = rows(doc, "qSelectDocTypes");
     EXPECT_EQ(docTypes.first(), "תעודת משלוח|True|False");
     // The scan range window writes through its query.

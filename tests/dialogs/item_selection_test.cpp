@@ -2,9 +2,9 @@
 #include "dialogs/item_selection.h"
 
 #include "db/db_fixture.h"
+#include "dialogs/bound_grid_model.h"
 #include "dialogs/items_query.h"
 #include "print/label_query.h"
-#include "dialogs/bound_grid_model.h"
 
 namespace etq::dialogs::test {
 namespace {
@@ -25,10 +25,7 @@ class ItemSelectionTest : public db::test::DbFolderTest {
         DbFolderTest::SetUp();
         jet::Database items = jet::Database::open(path(db::kItemDatabaseFile));
         items.execute(
-            "INSERT INTO tItems (ItemKey, ItemName, Coin, Price, Copies, PrintLabel) VALUES "
-            "('100', 'Soap', '¦', 1, 1, False), ('200', 'brush', '¦', 1, 1, False), "
-            "('300', 'Sponge', '¦', 1, 2, True), ('400', 'Bread', '¦', 1, 1, False), "
-            "('500', 'Salt', '¦', 1, 1, False), ('600', 'Sugar', '¦', 1, 1, False)");
+            "INSERT INTO tItems (ItemKey, ItemName, Coin, Price, Copies, PrintLabel) VALUES ('100', 'Soap', '¦', 1, 1, False), ('200', 'brush', '¦', 1, 1, False), ('300', 'Sponge', '¦', 1, 2, True), ('400', 'Bread', '¦', 1, 1, False), ('500', 'Salt', '¦', 1, 1, False), ('600', 'Sugar', '¦', 1, 1, False)");
     }
     void open(const QString& filter = {}) {
         selection = std::make_unique<ItemSelection>(grid, filter);

@@ -21,9 +21,7 @@ class SelectItemWindowTest : public db::test::DbFolderTest {
         DbFolderTest::SetUp();
         jet::Database items = jet::Database::open(path(db::kItemDatabaseFile));
         items.execute(
-            "INSERT INTO tItems (ItemKey, ItemName, Coin, Price, Copies, PrintLabel) VALUES "
-            "('100', 'סבון', '¦', 1, 1, False), ('200', 'מברשת', '¦', 1, 1, False), "
-            "('300', 'ספוג', '¦', 1, 1, False)");
+            "INSERT INTO tItems (ItemKey, ItemName, Coin, Price, Copies, PrintLabel) VALUES ('100', 'סבון', '¦', 1, 1, False), ('200', 'מברשת', '¦', 1, 1, False), ('300', 'ספוג', '¦', 1, 1, False)");
     }
     static void click(QWidget& window, const char* name) {
         window.findChild<QPushButton*>(name)->click();

@@ -250,9 +250,9 @@ TEST_F(DbfFileTest, ALayoutLongerThanTheRecordIsRefusedBeforeReading) {
         h::requireLayout(dbf, h::oitm::kLayout);
         FAIL() << "accepted";
     } catch (const DbfError& e) {
-        EXPECT_EQ(e.message(), file +
-                                   ": its records are 72 bytes long, shorter than the item "
-                                   "record (430 bytes)");
+        EXPECT_EQ(
+            e.message(),
+            file + ": its records are 72 bytes long, shorter than the item record (430 bytes)");
     }
 }
 

@@ -52,7 +52,8 @@ TEST_F(HostListsTest, CombosTakeNamedRecordsWithTheirNumbers) {
 }
 
 TEST_F(HostListsTest, CurrenciesAreAddedOrEditedAndTheLocalOneShowsTheShekelSign) {
-    EXPECT_FALSE(ReadCoinsMNHL(surface, context, company(), path(db::kDocDatabaseFile)));  // no ocrn.dbf
+    EXPECT_FALSE(
+        ReadCoinsMNHL(surface, context, company(), path(db::kDocDatabaseFile)));  // no ocrn.dbf
     // The delivered file holds the local currency; its blank description is kept.
     write("ocrn.dbf",
           QList<CurrencyRecord>{
@@ -77,10 +78,10 @@ TEST_F(HostListsTest, SpecialPricesAreStagedOncePerAccountAndItem) {
                                                 {"AB\"C", "20002", {-99, "$"}},
                                                 {"AB\"C", "20001", {7, {}}}});
     ASSERT_TRUE(ReadSpecialPriceMNHL(surface, context, company(), temp, {}, {}));
-    EXPECT_EQ(rows(db::kTempItemDatabaseFile,
-                   "SELECT AccountKey, ItemKey, Price, Coin FROM tTempAlterPrices "
-                   "ORDER BY AccountKey"),
-              (QStringList{"20001|AB'C|12.5|Null", "20002|AB'C|-0.99|$"}));
+    EXPECT_EQ(
+        rows(db::kTempItemDatabaseFile,
+             "SELECT AccountKey, ItemKey, Price, Coin FROM tTempAlterPrices ORDER BY AccountKey"),
+        (QStringList{"20001|AB'C|12.5|Null", "20002|AB'C|-0.99|$"}));
     EXPECT_TRUE(messages.shown.isEmpty());
     // Six records, the bar moving at the fifth.
     EXPECT_EQ(widths, (QList<int>{0, 500, 0}));

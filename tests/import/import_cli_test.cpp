@@ -22,7 +22,8 @@ TEST_F(ImportCliTest, CommandLineRunsOnTheDemoCompany) {
     EXPECT_EQ(QString::fromUtf8(cli.readAllStandardOutput()).trimmed(), GetCaption(38, 0));
     EXPECT_TRUE(cli.readAllStandardError().isEmpty());
     // Keys 10100 to 10119, but for 10110 (deleted) and the lettered KT-1116 in its place.
-    EXPECT_EQ(rows(db::kItemDatabaseFile, "SELECT min(ItemKey), count(*) FROM tItems WHERE ItemKey < 'A'"),
+    EXPECT_EQ(rows(db::kItemDatabaseFile,
+                   "SELECT min(ItemKey), count(*) FROM tItems WHERE ItemKey < 'A'"),
               QStringList{"10100|18"});
     EXPECT_FALSE(rows(db::kItemDatabaseFile, "SELECT ItemKey FROM tPriceList").isEmpty());
     EXPECT_FALSE(rows(db::kItemDatabaseFile, "SELECT ItemKey FROM tAlterPrices").isEmpty());

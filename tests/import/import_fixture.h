@@ -8,16 +8,16 @@
 #include <QFile>
 #include <QTemporaryDir>
 
+#include "card/import_adapters.h"
 #include "db/file_names.h"
 #include "db/local_databases.h"
-#include "card/import_adapters.h"
-#include "platform/context.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "jet/vb.h"
+#include "platform/context.h"
 #include "samples/host_records.h"
-#include "surface/memory_surface.h"
 #include "support/recording_messages.h"
+#include "surface/memory_surface.h"
 
 namespace etq::test {
 

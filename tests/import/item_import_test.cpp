@@ -2,11 +2,11 @@
 
 #include <QProcess>
 
-#include "import_fixture.h"
-#include "samples/demo_company.h"
-#include "platform/captions.h"
 #include "card/card_controller.h"
 #include "card/component.h"
+#include "import_fixture.h"
+#include "platform/captions.h"
+#include "samples/demo_company.h"
 
 namespace etq::test {
 namespace {

@@ -13,8 +13,8 @@ class ItemReaderTest : public ImportTest {
   protected:
     bool read(qint16 foreign = 0, qint16 copies = 1, qint16 priceField = 1,
               bool priceLists = false) {
-        return ReadItemMNHL(surface, context, company(), temp, {}, {}, foreign, copies, priceField, true,
-                            false, priceLists);
+        return ReadItemMNHL(surface, context, company(), temp, {}, {}, foreign, copies, priceField,
+                            true, false, priceLists);
     }
     QStringList items(const QString& fields = "ItemKey") const {
         return rows(db::kItemDatabaseFile, "SELECT " + fields + " FROM tItems ORDER BY ItemKey");
@@ -45,11 +45,12 @@ TEST_F(ItemReaderTest, WritesEveryFieldAndUpdatesOnTheNextRead) {
     ItemRecord bare = item("20", "");  // no names, no group: those fields stay null
     write("oitm.dbf", QList{milk, bare});
     ASSERT_TRUE(read(0, 3));
-    EXPECT_EQ(items("ItemKey, ItemName, Fname, ItemSort, Unit, BarCode, SuppCatNum, Copies, "
-                    "Price, Coin, SalPackUN, PurPackUN, IgnoreInDoc"),
-              (QStringList{QStringLiteral("10023|חלב 3%|Milk|12|ליטר|7290000066318|S-77|3|19.99|"
-                                          "¦|1|1|Null"),
-                           "20|Null|Null|Null|Null|Null|Null|3|0|¦|1|1|Null"}));
+    EXPECT_EQ(
+        items(
+            "ItemKey, ItemName, Fname, ItemSort, Unit, BarCode, SuppCatNum, Copies, Price, Coin, SalPackUN, PurPackUN, IgnoreInDoc"),
+        (QStringList{
+            QStringLiteral("10023|חלב 3%|Milk|12|ליטר|7290000066318|S-77|3|19.99|¦|1|1|Null"),
+            "20|Null|Null|Null|Null|Null|Null|3|0|¦|1|1|Null"}));
 
     // Price 2 in dollars; a blank barcode keeps the stored one; foreign names replace names,
     // a blank foreign name leaves the stored name.

@@ -199,8 +199,7 @@ TEST_F(DatabaseTest, TheStockShellReadsTheFiles) {
     shell.start(
         "sqlite3",
         {file("a.kdb"),
-         "SELECT ItemKey FROM tItems WHERE ItemKey = 'a' ORDER BY ItemKey; "
-         "SELECT SQL FROM MSysQueries; SELECT type FROM pragma_table_info('tItems') LIMIT 2;"});
+         "SELECT ItemKey FROM tItems WHERE ItemKey = 'a' ORDER BY ItemKey; SELECT SQL FROM MSysQueries; SELECT type FROM pragma_table_info('tItems') LIMIT 2;"});
     ASSERT_TRUE(shell.waitForFinished());
     EXPECT_EQ(QString::fromUtf8(shell.readAllStandardOutput()).split('\n', Qt::SkipEmptyParts),
               QStringList({"A", "SELECT ItemKey FROM tItems ORDER BY tItems.Itemkey", "TEXT(20)",

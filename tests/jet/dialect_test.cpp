@@ -16,36 +16,33 @@ class DialectTest : public JetTest {
               field("Price", FieldType::Double), text("Coin", 3)},
              {"ItemKey"}});
         db.execute(
-            "INSERT INTO tItems VALUES ('1', 'Soap', True, 12.5, '¦'), ('2', 'Brush', False, 3, "
-            "Null), "
-            "('3', Null, False, Null, '$')");
+            "INSERT INTO tItems VALUES ('1', 'Soap', True, 12.5, '¦'), ('2', 'Brush', False, 3, Null), ('3', Null, False, Null, '$')");
     }
     QStringList q(const QString& sql) { return rows(db, sql); }
     Database db;
 };
 
 TEST_F(DialectTest, PlusJoinsTextsAndNullSpreads) {
-    EXPECT_EQ(q("SELECT (ItemName + '') AS N, ItemName + ' ' + Coin AS C, Price + 1 AS P FROM "
-                "tItems ORDER BY ItemKey"),
-              QStringList({"Soap|Soap ¦|13.5", "Brush|Null|4", "Null|Null|Null"}));
+    EXPECT_EQ(
+        q("SELECT (ItemName + '') AS N, ItemName + ' ' + Coin AS C, Price + 1 AS P FROM tItems ORDER BY ItemKey"),
+        QStringList({"Soap|Soap ¦|13.5", "Brush|Null|4", "Null|Null|Null"}));
     EXPECT_EQ(q("SELECT '1' + 2, 'a' & Null & 1"), QStringList({"3|a1"}));
 }
 
 TEST_F(DialectTest, ValReadsALeadingNumber) {
-    EXPECT_EQ(q("SELECT Val('12abc'), Val(' 1 2 '), Val(Null), Val('&H1F'), Val('abc'), "
-                "Val('-3.5e1x'), Val([ItemName]) "
-                "FROM tItems WHERE ItemKey = '3'"),
-              QStringList({"12|12|0|31|0|-35|0"}));
+    EXPECT_EQ(
+        q("SELECT Val('12abc'), Val(' 1 2 '), Val(Null), Val('&H1F'), Val('abc'), Val('-3.5e1x'), Val([ItemName]) FROM tItems WHERE ItemKey = '3'"),
+        QStringList({"12|12|0|31|0|-35|0"}));
 }
 
 TEST_F(DialectTest, FormatDateAndLike) {
     const qint64 today = qint64(vb::today());
-    EXPECT_EQ(q("SELECT Format$(45658,'dd/mm/yy'), Format$(12.5,'0.00'), Format(100/6,'00.0'), "
-                "Format$(100/12,'00.0'), Format$(100/1,'00.0'), Date()"),
-              QStringList({QString("01/01/25|12.50|16.7|08.3|100.0|%1").arg(today)}));
-    EXPECT_EQ(q("SELECT ItemKey FROM tItems WHERE ItemName Like 's*' OR ItemName Like '?RUSH' "
-                "ORDER BY ItemKey"),
-              QStringList({"1", "2"}));
+    EXPECT_EQ(
+        q("SELECT Format$(45658,'dd/mm/yy'), Format$(12.5,'0.00'), Format(100/6,'00.0'), Format$(100/12,'00.0'), Format$(100/1,'00.0'), Date()"),
+        QStringList({QString("01/01/25|12.50|16.7|08.3|100.0|%1").arg(today)}));
+    EXPECT_EQ(
+        q("SELECT ItemKey FROM tItems WHERE ItemName Like 's*' OR ItemName Like '?RUSH' ORDER BY ItemKey"),
+        QStringList({"1", "2"}));
     EXPECT_EQ(q("SELECT ItemKey FROM tItems WHERE ItemName Not Like '*o*'"), QStringList({"2"}));
     EXPECT_EQ(q("SELECT ItemKey FROM tItems WHERE ItemName Like '*[bc]*'"), QStringList({"2"}));
 }
@@ -55,12 +52,12 @@ TEST_F(DialectTest, LiteralsNamesAndTrueFalse) {
               QStringList({"1|it's"}));
     EXPECT_EQ(q("SELECT Count(*) FROM tItems WHERE PrintLabel = False AND ItemKey <> \"2\""),
               QStringList({"1"}));
-    EXPECT_EQ(q("SELECT ItemKey FROM tItems WHERE ItemName Is Null Or Price Between 3 And 4 ORDER "
-                "BY ItemKey"),
-              QStringList({"2", "3"}));
-    EXPECT_EQ(q("SELECT IIf(PrintLabel, 'yes', 'no'), Nz(ItemName, '-') FROM tItems ORDER BY "
-                "ItemKey DESC"),
-              QStringList({"no|-", "no|Brush", "yes|Soap"}));
+    EXPECT_EQ(
+        q("SELECT ItemKey FROM tItems WHERE ItemName Is Null Or Price Between 3 And 4 ORDER BY ItemKey"),
+        QStringList({"2", "3"}));
+    EXPECT_EQ(
+        q("SELECT IIf(PrintLabel, 'yes', 'no'), Nz(ItemName, '-') FROM tItems ORDER BY ItemKey DESC"),
+        QStringList({"no|-", "no|Brush", "yes|Soap"}));
     // An unnamed expression is named as the engine names it.
     Recordset rs = db.openRecordset("SELECT ItemKey, Price * 2 FROM tItems");
     EXPECT_EQ(rs.fieldName(1), "Expr1001");
@@ -86,11 +83,7 @@ TEST_F(DialectTest, OuterJoinUpdateUpdatesMatchesAndAddsTheMissing) {
     db.execute("INSERT INTO tPrices VALUES ('1', 1, 10, '$'), ('1', 2, 20, '$')");
     db.execute("INSERT INTO tStage VALUES ('1', 1, 11, 'EU'), ('2', 1, 5, '¦'), ('2', 11, 7, '¦')");
     const QString merge =
-        "UPDATE tStage LEFT JOIN tPrices ON (tStage.ItemKey = tPrices.ItemKey) AND "
-        "(tStage.PriceList = "
-        "tPrices.PriceList) SET tPrices.ItemKey = tStage.ItemKey, tPrices.PriceList = "
-        "tStage.PriceList, "
-        "tPrices.Price = tStage.Price, tPrices.Currency = tStage.Currency";
+        "UPDATE tStage LEFT JOIN tPrices ON (tStage.ItemKey = tPrices.ItemKey) AND (tStage.PriceList = tPrices.PriceList) SET tPrices.ItemKey = tStage.ItemKey, tPrices.PriceList = tStage.PriceList, tPrices.Price = tStage.Price, tPrices.Currency = tStage.Currency";
     EXPECT_EQ(db.execute(merge + " Where tStage.PriceList = 1"), 2);
     EXPECT_EQ(
         q("SELECT ItemKey, PriceList, Price, Currency FROM tPrices ORDER BY ItemKey, PriceList"),
@@ -102,8 +95,7 @@ TEST_F(DialectTest, InnerJoinUpdateWritesTheNamedTable) {
     db.createTable({"tMarks", {text("ItemKey", 20)}, {"ItemKey"}});
     db.execute("INSERT INTO tMarks VALUES ('2')");
     db.execute(
-        "UPDATE tItems INNER JOIN tMarks ON tItems.ItemKey = tMarks.ItemKey SET tItems.PrintLabel "
-        "= True");
+        "UPDATE tItems INNER JOIN tMarks ON tItems.ItemKey = tMarks.ItemKey SET tItems.PrintLabel = True");
     EXPECT_EQ(q("SELECT ItemKey FROM tItems WHERE PrintLabel ORDER BY ItemKey"),
               QStringList({"1", "2"}));
 }

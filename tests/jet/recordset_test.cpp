@@ -19,11 +19,9 @@ class RecordsetTest : public JetTest {
                          field("Include", FieldType::Boolean)},
                         {"HeadNumber", "LineNum"}});
         db.execute(
-            "INSERT INTO tItems (ItemKey, ItemName, Copies, PrintLabel) VALUES "
-            "('100', 'Soap', 1, False), ('2', 'Brush', 1, True), ('ab''c', 'Quote', 0, False)");
+            "INSERT INTO tItems (ItemKey, ItemName, Copies, PrintLabel) VALUES ('100', 'Soap', 1, False), ('2', 'Brush', 1, True), ('ab''c', 'Quote', 0, False)");
         db.execute(
-            "INSERT INTO tLines VALUES (7, 1, '100', 3, True), (7, 2, '2', 1, True), (8, 1, "
-            "'none', 1, True)");
+            "INSERT INTO tLines VALUES (7, 1, '100', 3, True), (7, 2, '2', 1, True), (8, 1, 'none', 1, True)");
     }
     Database db;
 };
@@ -133,10 +131,7 @@ TEST_F(RecordsetTest, AFailedUpdateKeepsTheEditPendingAndWritesNothing) {
 
 TEST_F(RecordsetTest, AJoinedQueryWritesItsBaseTables) {
     Recordset rs = db.openRecordset(
-        "SELECT tLines.LineNum, tLines.ItemKey, tItems.ItemName, tLines.Copies, tLines.Include, "
-        "(tLines.Copies + 1) AS More FROM (tLines Inner Join tItems On tItems.ItemKey = "
-        "tLines.ItemKey) "
-        "ORDER BY tLines.HeadNumber, tLines.LineNum");
+        "SELECT tLines.LineNum, tLines.ItemKey, tItems.ItemName, tLines.Copies, tLines.Include, (tLines.Copies + 1) AS More FROM (tLines Inner Join tItems On tItems.ItemKey = tLines.ItemKey) ORDER BY tLines.HeadNumber, tLines.LineNum");
     ASSERT_EQ(rs.recordCount(), 2);  // the line whose item is missing does not show
     EXPECT_TRUE(rs.isUpdatable(rs.fieldIndex("Copies")));
     EXPECT_FALSE(rs.isUpdatable(rs.fieldIndex("More")));

@@ -1,3 +1,3 @@
 // An import routine that reached up for the card's dispatch: must not build.
-#include "import/item_import.h"
 #include "card/card_controller.h"
+#include "import/item_import.h"

@@ -21,9 +21,7 @@ class CliPrintTest : public ::testing::Test {
         ASSERT_EQ(cli({"init-db", "--db", db()}).exitCode, 0);
         jet::Database items = jet::Database::open(db() + "/etqnitm.kdb");
         items.execute(
-            "INSERT INTO tItems (ItemKey, ItemName, BarCode, Coin, Price, Copies, PrintLabel) "
-            "VALUES ('A1', 'סבון', '7290000000015', '¦', 1, 1, False), "
-            "('B2', 'מברשת', '7290000000022', '¦', 2, 1, False)");
+            "INSERT INTO tItems (ItemKey, ItemName, BarCode, Coin, Price, Copies, PrintLabel) VALUES ('A1', 'סבון', '7290000000015', '¦', 1, 1, False), ('B2', 'מברשת', '7290000000022', '¦', 2, 1, False)");
         // Settings of this SettingID stay between tests run in one process: each starts from these.
         for (const char* kv : {"0LabelDef UseCell True", "0LabelDef FldID 1",
                                "GeneralParams OptOLE0 False", "GeneralParams OptOLE3 True"})

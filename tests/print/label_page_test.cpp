@@ -4,10 +4,10 @@
 
 #include <QFileInfo>
 
+#include "card/print_adapters.h"
 #include "platform/codepage1255.h"
 #include "platform/print_folder.h"
 #include "print/label_query.h"
-#include "card/print_adapters.h"
 #include "print_fixture.h"
 
 namespace etq::print::test {
@@ -56,8 +56,7 @@ class LabelPageTest : public PrintTest {
     }
     static QString imageRow(int cell, const QString& bitmap) {
         return QString(
-                   "    <tr align='center'><td class='L%1'><img src='%2'  width=100 "
-                   "height=50></img></td></tr>")
+                   "    <tr align='center'><td class='L%1'><img src='%2'  width=100 height=50></img></td></tr>")
             .arg(cell)
             .arg(bitmap);
     }
@@ -152,26 +151,21 @@ TEST_F(LabelPageTest, CellsKeepTheirIndexInClassesAndStyles) {
     EXPECT_EQ(positions(lines)[0],
               QStringList({textRow(0, "K01"), textRow(2, "פריט 1"), textRow(5, "11.00 ₪")}));
     const qsizetype style = lines.indexOf("<style>");
-    EXPECT_EQ(lines.mid(0, style + 1),
-              QStringList({"<HTML>", "<HEAD>", "<TITLE>מדבקות פריטים</TITLE>",
-                           "<meta http-equiv='Content-Type' content='text/html; "
-                           "charset=windows-1255'>",
-                           "<style>"}));
+    EXPECT_EQ(
+        lines.mid(0, style + 1),
+        QStringList({"<HTML>", "<HEAD>", "<TITLE>מדבקות פריטים</TITLE>",
+                     "<meta http-equiv='Content-Type' content='text/html; charset=windows-1255'>",
+                     "<style>"}));
     EXPECT_EQ(
         lines.mid(style + 1, 8),
-        QStringList({"       .L0 {font-family:Arial (Hebrew); font-weight:Normal; font-size:9pt; "
-                     "font-style:Normal; text-align:Center; direction:rtl; color:black;}",
-                     "       .L2 {font-family:David; font-weight:Bold; font-size:12pt; "
-                     "font-style:Italic; text-decoration: underline; text-align:Left; "
-                     "direction:ltr; height: 14pt; border: thin solid black; color:black;}",
-                     "       .L5 {font-family:Arial (Hebrew); font-weight:Normal; font-size:9pt; "
-                     "font-style:Normal; text-align:Center; direction:rtl; color:black;}",
-                     "       TR {vertical-align: middle; }", "       TD {vertical-align: middle; }",
-                     "       TABLE {border: none; direction: rtl; padding: 0; word-spacing: 0; "
-                     "letter-spacing: 0}",
-                     "       .Lab {border: none; direction: rtl; padding: 1; word-spacing: 0; "
-                     "letter-spacing: 0; margin-top: 0; margin-bottom: 0}",
-                     "</style>"}));
+        QStringList(
+            {"       .L0 {font-family:Arial (Hebrew); font-weight:Normal; font-size:9pt; font-style:Normal; text-align:Center; direction:rtl; color:black;}",
+             "       .L2 {font-family:David; font-weight:Bold; font-size:12pt; font-style:Italic; text-decoration: underline; text-align:Left; direction:ltr; height: 14pt; border: thin solid black; color:black;}",
+             "       .L5 {font-family:Arial (Hebrew); font-weight:Normal; font-size:9pt; font-style:Normal; text-align:Center; direction:rtl; color:black;}",
+             "       TR {vertical-align: middle; }", "       TD {vertical-align: middle; }",
+             "       TABLE {border: none; direction: rtl; padding: 0; word-spacing: 0; letter-spacing: 0}",
+             "       .Lab {border: none; direction: rtl; padding: 1; word-spacing: 0; letter-spacing: 0; margin-top: 0; margin-bottom: 0}",
+             "</style>"}));
     // The page ticked the cells' fields on the label tab.
     EXPECT_EQ(surface.control("ChkFldSend", 6).value().toInt(), 1);
 }
@@ -266,7 +260,8 @@ TEST_F(PrintRunTest, BarcodeOnAnUntickedFieldFailsUntilTheBoxIsTicked) {
 
 TEST_F(PrintRunTest, MissingDatabaseIsReported) {
     useCell(0, 1);
-    EXPECT_TRUE(PrintBuiltInLabels(surface, context, dir.path() + "/none.tmp", ItemLabels).isEmpty());
+    EXPECT_TRUE(
+        PrintBuiltInLabels(surface, context, dir.path() + "/none.tmp", ItemLabels).isEmpty());
     ASSERT_EQ(messages.shown.size(), 1);
     EXPECT_EQ(messages.shown[0].title, "תקלה");
 }

@@ -10,8 +10,7 @@ namespace etq::print::test {
 namespace {
 
 const QString kHead =
-    "SELECT tItems.ItemKey, tItems.ItemName, tItems.ItemSort, tItems.FName, tItems.BarCode, "
-    "tItems.Local, tItems.Unit, tItems.Price, tItems.Coin, tCurrencies.WizSign AS CoinSign";
+    "SELECT tItems.ItemKey, tItems.ItemName, tItems.ItemSort, tItems.FName, tItems.BarCode, tItems.Local, tItems.Unit, tItems.Price, tItems.Coin, tCurrencies.WizSign AS CoinSign";
 const QString kFrom = " FROM (tCurrencies INNER JOIN tItems ON tCurrencies.Currency = tItems.Coin)";
 
 LabelQueryInput withSlots(std::initializer_list<int> slots, quint8 queryType = ItemLabels) {
@@ -31,9 +30,9 @@ LabelQueryInput allSlots(quint8 queryType) {
 
 TEST(LabelQueryText, PlainItemQueryIsHeadCopiesFromAndOrder) {
     LabelQueryInput in;
-    EXPECT_EQ(BuildLabelQuery(in), kHead + ", tItems.Copies, '' As AccountLabel" + kFrom +
-                                       " WHERE (1 > 0) And tItems.PrintLabel = True"
-                                       " ORDER BY tItems.Itemkey ASC");
+    EXPECT_EQ(BuildLabelQuery(in),
+              kHead + ", tItems.Copies, '' As AccountLabel" + kFrom +
+                  " WHERE (1 > 0) And tItems.PrintLabel = True ORDER BY tItems.Itemkey ASC");
     in.order = Descending;
     EXPECT_TRUE(BuildLabelQuery(in).endsWith(" ORDER BY tItems.Itemkey DESC"));
     in.order = 0;  // no direction word, the blank stays
@@ -43,21 +42,15 @@ TEST(LabelQueryText, PlainItemQueryIsHeadCopiesFromAndOrder) {
 TEST(LabelQueryText, AccountModeNeedsTheFlagAndAKey) {
     LabelQueryInput in = withSlots({9, 14, 15});
     in.useAccountKey = true;  // but no key: the forms without an account
-    EXPECT_EQ(BuildLabelQuery(in),
-              kHead +
-                  ", tItems.Copies, '' As AccountLabel, 'NoCode' AS CardCode, tItems.Price AS "
-                  "ListPrice, 'NoName' AS CardName" +
-                  kFrom +
-                  " WHERE (1 > 0) And tItems.PrintLabel = True ORDER BY tItems.Itemkey ASC");
+    EXPECT_EQ(
+        BuildLabelQuery(in),
+        kHead +
+            ", tItems.Copies, '' As AccountLabel, 'NoCode' AS CardCode, tItems.Price AS ListPrice, 'NoName' AS CardName" +
+            kFrom + " WHERE (1 > 0) And tItems.PrintLabel = True ORDER BY tItems.Itemkey ASC");
     in.accountKey = "C1";
     const QString sql = BuildLabelQuery(in);
-    EXPECT_TRUE(
-        sql.contains(", tItems.Copies, (Select LabelName From tAccountDef Where "
-                     "tAccountDef.AccountKey = 'C1') As AccountLabel, 'C1' As CardCode, "
-                     "(Select Price From tAccountDef, tPriceList Where "
-                     "tAccountDef.AccountKey = 'C1' And tPriceList.ItemKey = "
-                     "tItems.ItemKey And tPriceList.PriceList = tAccountDef.PriceList) As "
-                     "ListPrice, 'C1' As CardName FROM"));
+    EXPECT_TRUE(sql.contains(
+        ", tItems.Copies, (Select LabelName From tAccountDef Where tAccountDef.AccountKey = 'C1') As AccountLabel, 'C1' As CardCode, (Select Price From tAccountDef, tPriceList Where tAccountDef.AccountKey = 'C1' And tPriceList.ItemKey = tItems.ItemKey And tPriceList.PriceList = tAccountDef.PriceList) As ListPrice, 'C1' As CardName FROM"));
     in.useAccountKey = false;  // a key without the flag: no account either
     EXPECT_TRUE(BuildLabelQuery(in).contains("'NoCode' AS CardCode"));
 }
@@ -76,9 +69,9 @@ TEST(LabelQueryText, ItemRangeTakesEachBoundAlone) {
 
 TEST(LabelQueryText, SlotsFollowTheirFixedOrderWithTwelveBeforeEleven) {
     const QString sql = BuildLabelQuery(withSlots({11, 12, 40, 8, 0, 27, 31}));
-    EXPECT_EQ(sql.mid(kHead.size(), sql.indexOf(" FROM") - kHead.size()),
-              ", tItems.Copies, '' As AccountLabel, 'NoSerial' AS SerialNum, tItems.ItemKey As "
-              "AlterKey, tItems.Price AS SpecialPrice, '' As CompName");
+    EXPECT_EQ(
+        sql.mid(kHead.size(), sql.indexOf(" FROM") - kHead.size()),
+        ", tItems.Copies, '' As AccountLabel, 'NoSerial' AS SerialNum, tItems.ItemKey As AlterKey, tItems.Price AS SpecialPrice, '' As CompName");
     EXPECT_LT(sql.indexOf("AS AlterKey", 0, Qt::CaseInsensitive), sql.indexOf("SpecialPrice"));
 }
 
@@ -98,17 +91,9 @@ TEST(LabelQueryText, DocumentLinesIgnoreAccountAndRange) {
     EXPECT_EQ(
         BuildLabelQuery(in),
         kHead +
-            ", tTempDocHeaders.WizFileID, tTempDocHeaders.Number, tTempDocLines.Copies, (Select "
-            "LabelName From tAccountDef Where tAccountDef.AccountKey = tTempDocHeaders.AccountKey) "
-            "As AccountLabel, tTempDocHeaders.AccountKey As CardCode, (Select AlterNum From "
-            "tAlterKeys Where AccountKey = tTempDocHeaders.AccountKey And ItemKey = "
-            "tItems.ItemKey) AS AlterKey" +
+            ", tTempDocHeaders.WizFileID, tTempDocHeaders.Number, tTempDocLines.Copies, (Select LabelName From tAccountDef Where tAccountDef.AccountKey = tTempDocHeaders.AccountKey) As AccountLabel, tTempDocHeaders.AccountKey As CardCode, (Select AlterNum From tAlterKeys Where AccountKey = tTempDocHeaders.AccountKey And ItemKey = tItems.ItemKey) AS AlterKey" +
             kFrom +
-            " , tTempDocHeaders, tTempDocLines WHERE (1 > 0) And tTempDocLines.WizFileID = "
-            "tTempDocHeaders.WizFileID And tTempDocLines.HeadNumber = tTempDocHeaders.Number And "
-            "tItems.Itemkey = tTempDocLines.Itemkey And (tTempDocHeaders.Include = True) And "
-            "(tTempDocLines.Include = True) ORDER BY tTempDocLines.WizFileID DESC, "
-            "tTempDocLines.HeadNumber DESC, tTempDocLines.LineNum DESC");
+            " , tTempDocHeaders, tTempDocLines WHERE (1 > 0) And tTempDocLines.WizFileID = tTempDocHeaders.WizFileID And tTempDocLines.HeadNumber = tTempDocHeaders.Number And tItems.Itemkey = tTempDocLines.Itemkey And (tTempDocHeaders.Include = True) And (tTempDocLines.Include = True) ORDER BY tTempDocLines.WizFileID DESC, tTempDocLines.HeadNumber DESC, tTempDocLines.LineNum DESC");
 }
 
 TEST(LabelQueryText, SurfaceGivesTheLabelTabsValues) {
@@ -190,15 +175,9 @@ TEST_F(LabelQueryRun, EverySlotRunsForBothQueryTypes) {
 
 TEST_F(LabelQueryRun, DocumentLinesOfIncludedDocumentsWithTheirAccount) {
     work.execute(
-        "INSERT INTO tTempDocHeaders (WizFileID, [Number], RecIndex, DocType, Reference1, "
-        "AccountKey, Include, CardName, City) VALUES "
-        "(1, 500, 0, 1, 7001, 'C''1', True, 'לקוח', 'חיפה'), "
-        "(1, 501, 1, 1, 7002, 'C2', False, 'אחר', 'עכו')");
+        "INSERT INTO tTempDocHeaders (WizFileID, [Number], RecIndex, DocType, Reference1, AccountKey, Include, CardName, City) VALUES (1, 500, 0, 1, 7001, 'C''1', True, 'לקוח', 'חיפה'), (1, 501, 1, 1, 7002, 'C2', False, 'אחר', 'עכו')");
     work.execute(
-        "INSERT INTO tTempDocLines (WizFileID, HeadNumber, LineNum, [Number], ItemKey, Copies, "
-        "Include, SerialNum) VALUES (1, 500, 1, 0, '100', 3, True, 'SN1'), "
-        "(1, 500, 2, 0, '999', 1, True, Null), (1, 500, 3, 0, 'O''K', 1, False, Null), "
-        "(1, 501, 1, 1, '100', 1, True, Null)");
+        "INSERT INTO tTempDocLines (WizFileID, HeadNumber, LineNum, [Number], ItemKey, Copies, Include, SerialNum) VALUES (1, 500, 1, 0, '100', 3, True, 'SN1'), (1, 500, 2, 0, '999', 1, True, Null), (1, 500, 3, 0, 'O''K', 1, False, Null), (1, 501, 1, 1, '100', 1, True, Null)");
     LabelQueryInput in = allSlots(DocumentLineLabels);
     jet::Recordset rs = work.openRecordset(BuildLabelQuery(in));
     // Line 2's item is unknown, line 3 and document 501 are left out.

@@ -4,9 +4,9 @@
 
 #include <QFileInfo>
 
-#include "print_fixture.h"
 #include "card/card_controller.h"
 #include "card/component.h"
+#include "print_fixture.h"
 
 namespace etq::print::test {
 namespace {

@@ -7,8 +7,8 @@
 #include "platform/browser.h"
 #include "platform/context.h"
 #include "platform/settings_store.h"
-#include "support/recording_messages.h"
 #include "print/label_definition.h"
+#include "support/recording_messages.h"
 #include "surface/memory_surface.h"
 
 namespace etq::print::test {

@@ -6,12 +6,12 @@
 #include <QRegularExpression>
 #include <QSettings>
 
+#include "platform/label_fields.h"
 #include "platform/settings_store.h"
 #include "platform/user_paths.h"
-#include "platform/label_fields.h"
+#include "support/test_env.h"
 #include "surface/memory_surface.h"
 #include "surface/settings_groups.h"
-#include "support/test_env.h"
 
 namespace etq {
 namespace {
