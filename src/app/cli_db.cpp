@@ -43,6 +43,7 @@ bool prepareFolder(const QString& folder) {
 
 int runInitDb(const QStringList& arguments) {
     QStringList args = arguments;
+    takeCommonOptions(args);  // the database folder is the same for every SettingID
     const QString folder = takeOption(args, "--db");
     if (folder.isEmpty() || !args.isEmpty()) {
         printError("usage: etiquon-cli init-db --db DIR");
@@ -100,6 +101,7 @@ int runInitDb(const QStringList& arguments) {
 
 int runUpgrade(const QStringList& arguments) {
     QStringList args = arguments;
+    takeCommonOptions(args);
     const QString folder = takeOption(args, "--db");
     if (folder.isEmpty() || !args.isEmpty()) {
         printError("usage: etiquon-cli upgrade --db DIR");

@@ -10,6 +10,8 @@
 #include "jet/error.h"
 #include "platform/browser.h"
 #include "platform/context.h"
+#include "platform/failure.h"
+#include "platform/log.h"
 #include "platform/messages.h"
 #include "platform/printers.h"
 #include "platform/progress.h"
@@ -33,11 +35,16 @@ class CountingSink : public MessageSink {
     StderrMessageSink stderrSink_;
 };
 
-// The installed printers, as the window lists them in cmbPrinter.
+// The installed printers, as the window lists them in cmbPrinter; none when CUPS cannot be
+// asked, which the window passes over too.
 EntryList printerEntries() {
     EntryList entries;
-    for (const QString& printer : installedPrinters())
-        entries.append({printer, 0});
+    try {
+        for (const QString& printer : listedPrinters(installedPrinters()))
+            entries.append({printer, 0});
+    } catch (const Failure& e) {
+        qCInfo(log::card) << "no printer list:" << e.description();
+    }
     return entries;
 }
 
@@ -132,11 +139,7 @@ int runPrintItems(const QStringList& arguments) {
         print = printItemLabels(options, context, progress);
     });
     if (status != 0) return status;
-    QString error;
-    if (!context.pages().showPage(print.pagePath, &error)) {
-        printError(error);
-        return 1;
-    }
+    if (runReporting([&] { context.pages().showPage(print.pagePath); })) return 1;
     if (!print.refusedBarcodes.isEmpty())
         printError(QStringLiteral("%1 labels have no barcode:\n%2")
                        .arg(print.refusedBarcodes.size())

@@ -48,9 +48,6 @@ bool opensDialog(const QString& element) {
     return false;
 }
 
-// The printer list leaves out Windows' own rendering pseudo-printer, should CUPS ever list it.
-const QString kNotAPrinter = QStringLiteral("Rendering Subsystem");
-
 }  // namespace
 
 // The elements the control handles itself. Every other element goes to its work, when
@@ -155,11 +152,18 @@ void CardController::FillCmbItmBelong() {
     if (hooks_.fillCmbItmBelong) hooks_.fillCmbItmBelong(surface_, context_);
 }
 
+QStringList listedPrinters(const QStringList& installed) {
+    // Windows' own rendering pseudo-printer is no printer, should CUPS ever list it.
+    QStringList listed = installed;
+    listed.removeAll(QStringLiteral("Rendering Subsystem"));
+    return listed;
+}
+
 void CardController::fillPrinterList() {
     const ControlRef combo = surface_.control(QStringLiteral("cmbPrinter"));
     combo.clearList();
-    for (const QString& printer : hooks_.installedPrinters())
-        if (printer != kNotAPrinter) combo.addItem(printer);
+    for (const QString& printer : listedPrinters(hooks_.installedPrinters()))
+        combo.addItem(printer);
 }
 
 void CardController::click(const QString& element, int index) {

@@ -22,6 +22,9 @@ void loadLanguage(Context& context);
 // built-in label page is the chosen route.
 void loadStartUpLabelDefinition(const ControlValues& values, Context& context);
 
+// The printers cmbPrinter lists among those installed.
+QStringList listedPrinters(const QStringList& installed);
+
 // The work other parts of the component do for the control. Each hook is optional: an empty
 // one does nothing (or, for the upgrade, fails).
 struct CardHooks {

@@ -91,9 +91,7 @@ QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& db
     });
     showFieldChecks(surface, input.query);
     if (!printed) return {};
-    QString error;
-    if (!context.pages().showPage(print.pagePath, &error))
-        showCritical(context.messages(), error, kPageFailureTitle);
+    reportFailures(context, kPageFailureTitle, [&] { context.pages().showPage(print.pagePath); });
     if (!print.refusedBarcodes.isEmpty()) tellRefusedBarcodes(context, print.refusedBarcodes);
     return print.pagePath;
 }

@@ -3,14 +3,14 @@
 #include <QProcess>
 #include <QTextStream>
 
+#include "platform/failure.h"
+
 namespace etq {
 
-bool HeadlessPageViewer::showPage(const QString& path, QString* error) {
+void HeadlessPageViewer::showPage(const QString& path) {
     QTextStream(stdout) << path << Qt::endl;
-    if (!open_) return true;
-    if (QProcess::startDetached(QStringLiteral("xdg-open"), {path})) return true;
-    if (error) *error = QStringLiteral("Cannot start xdg-open to show %1").arg(path);
-    return false;
+    if (open_ && !QProcess::startDetached(QStringLiteral("xdg-open"), {path}))
+        throw Failure(QStringLiteral("Cannot start xdg-open to show %1").arg(path));
 }
 
 }  // namespace etq

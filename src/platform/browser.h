@@ -9,15 +9,15 @@ namespace etq {
 class PageViewer {
   public:
     virtual ~PageViewer() = default;
-    // False, with the reason in `error`, when the page could not be handed to a browser.
-    virtual bool showPage(const QString& path, QString* error) = 0;
+    // Throws Failure, with the reason, when the page could not be handed to a browser.
+    virtual void showPage(const QString& path) = 0;
 };
 
 // Prints the path as the last line on stdout; with `open`, also starts xdg-open on it.
 class HeadlessPageViewer : public PageViewer {
   public:
     explicit HeadlessPageViewer(bool open = false) : open_(open) {}
-    bool showPage(const QString& path, QString* error) override;
+    void showPage(const QString& path) override;
 
   private:
     bool open_;

@@ -2,41 +2,35 @@
 
 #include <QProcess>
 
+#include "platform/failure.h"
+
 namespace etq {
 
 namespace {
 
 constexpr int kWaitMs = 10000;
 
-// Runs a CUPS client program; its standard output, or nothing with the reason in `error`.
-bool runCups(const QString& program, const QStringList& args, QByteArray* output, QString* error) {
+// Runs a CUPS client program and gives its standard output; throws Failure with the reason.
+QByteArray runCups(const QString& program, const QStringList& args) {
     QProcess process;
     process.start(program, args);
-    if (!process.waitForStarted(kWaitMs)) {
-        if (error) *error = QStringLiteral("cannot run %1: %2").arg(program, process.errorString());
-        return false;
-    }
+    if (!process.waitForStarted(kWaitMs))
+        throw Failure(QStringLiteral("cannot run %1: %2").arg(program, process.errorString()));
     if (!process.waitForFinished(kWaitMs)) {
         process.kill();
         process.waitForFinished();
-        if (error) *error = QStringLiteral("%1 did not answer").arg(program);
-        return false;
+        throw Failure(QStringLiteral("%1 did not answer").arg(program));
     }
-    if (process.exitStatus() != QProcess::NormalExit || process.exitCode() != 0) {
-        if (error)
-            *error = QStringLiteral("%1: %2").arg(
-                program, QString::fromLocal8Bit(process.readAllStandardError()).trimmed());
-        return false;
-    }
-    if (output) *output = process.readAllStandardOutput();
-    return true;
+    if (process.exitStatus() != QProcess::NormalExit || process.exitCode() != 0)
+        throw Failure(QStringLiteral("%1: %2").arg(
+            program, QString::fromLocal8Bit(process.readAllStandardError()).trimmed()));
+    return process.readAllStandardOutput();
 }
 
 }  // namespace
 
-QStringList installedPrinters(QString* error) {
-    QByteArray output;
-    if (!runCups(QStringLiteral("lpstat"), {QStringLiteral("-e")}, &output, error)) return {};
+QStringList installedPrinters() {
+    const QByteArray output = runCups(QStringLiteral("lpstat"), {QStringLiteral("-e")});
     QStringList printers;
     for (const QByteArray& line : output.split('\n')) {
         const QString name = QString::fromLocal8Bit(line).trimmed();
@@ -45,8 +39,8 @@ QStringList installedPrinters(QString* error) {
     return printers;
 }
 
-bool setDefaultPrinter(const QString& name, QString* error) {
-    return runCups(QStringLiteral("lpoptions"), {QStringLiteral("-d"), name}, nullptr, error);
+void setDefaultPrinter(const QString& name) {
+    runCups(QStringLiteral("lpoptions"), {QStringLiteral("-d"), name});
 }
 
 }  // namespace etq

@@ -5,12 +5,12 @@
 
 namespace etq {
 
-// The installed printers: the CUPS destinations of this machine, by name. Empty, with the
-// reason in `error`, when CUPS cannot be asked.
-QStringList installedPrinters(QString* error = nullptr);
+// The installed printers: the CUPS destinations of this machine, by name. Throws Failure with
+// the reason when CUPS cannot be asked.
+QStringList installedPrinters();
 
-// Makes `name` the user's default printer (lpoptions -d). False, with the reason in `error`,
-// when CUPS refuses.
-bool setDefaultPrinter(const QString& name, QString* error = nullptr);
+// Makes `name` the user's default printer (lpoptions -d). Throws Failure with the reason when
+// CUPS refuses.
+void setDefaultPrinter(const QString& name);
 
 }  // namespace etq

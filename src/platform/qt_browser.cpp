@@ -3,12 +3,13 @@
 #include <QDesktopServices>
 #include <QUrl>
 
+#include "platform/failure.h"
+
 namespace etq {
 
-bool DesktopPageViewer::showPage(const QString& path, QString* error) {
-    if (QDesktopServices::openUrl(QUrl::fromLocalFile(path))) return true;
-    if (error) *error = QStringLiteral("No browser could be started to show %1").arg(path);
-    return false;
+void DesktopPageViewer::showPage(const QString& path) {
+    if (!QDesktopServices::openUrl(QUrl::fromLocalFile(path)))
+        throw Failure(QStringLiteral("No browser could be started to show %1").arg(path));
 }
 
 }  // namespace etq

@@ -7,7 +7,7 @@ namespace etq {
 // Opens pages in the desktop's default browser.
 class DesktopPageViewer : public PageViewer {
   public:
-    bool showPage(const QString& path, QString* error) override;
+    void showPage(const QString& path) override;
 };
 
 }  // namespace etq

@@ -21,8 +21,7 @@ QString prepareItemPrint(const ItemPrintOptions& options) {
             QStringLiteral(
                 "No label software can be driven on this system (kind %1): choose \"Direct\" to print on the built-in label page")
                 .arg(options.kind));
-    QString error;
-    if (options.printer && !setDefaultPrinter(*options.printer, &error)) throw Failure(error);
+    if (options.printer) setDefaultPrinter(*options.printer);
     return workDb;
 }
 

@@ -6,12 +6,15 @@
 #include <QFile>
 #include <QTemporaryDir>
 
+#include "card/boundary.h"
 #include "card/card_controller.h"
 #include "card/print_adapters.h"
 #include "card_test_support.h"
 #include "import/connection.h"
+#include "jet/error.h"
 #include "platform/captions.h"
 #include "platform/context.h"
+#include "platform/failure.h"
 #include "platform/settings_store.h"
 #include "print/label_software.h"
 #include "surface/memory_surface.h"
@@ -362,6 +365,45 @@ TEST_F(CardTest, CheckAllAndClearAllGoToTheDocumentTypeGrid) {
     card.click("cmdAllDocTypes");
     card.click("cmdNoDocTypes");
     EXPECT_EQ(marks, (QList<bool>{true, false}));
+}
+
+}  // namespace
+}  // namespace etq
+
+namespace etq {
+namespace {
+
+// The window tells a failure of the logic in a critical box with the boundary's title (or the
+// failure's own), and passes over those it has always kept to itself; either way the work
+// counts as not done.
+TEST(BoundaryTest, FailuresAreShownAsTheWindowHasAlwaysShownThem) {
+    struct Case {
+        std::function<void()> work;
+        bool done;
+        QString title;  // of the message shown; empty: none shown
+        QString text;
+    };
+    const Case cases[] = {
+        {[] { throw jet::JetError(3022, "Duplicate key"); }, false, "Title", "Duplicate key"},
+        {[] { throw HostFileDamaged("oitm.dbf is cut short"); }, false, "Title",
+         "oitm.dbf is cut short"},
+        {[] { throw Failure("Database not found", "Error"); }, false, "Error",
+         "Database not found"},
+        {[] { throw HostFileMissing("no oitm.dbf"); }, false, {}, {}},
+        {[] { throw QuietFailure("tCurrencies is read-only"); }, false, {}, {}},
+        {[] {}, true, {}, {}},
+    };
+    for (const Case& c : cases) {
+        test::RecordingMessages sink;
+        Context context;
+        context.setMessages(&sink);
+        EXPECT_EQ(reportFailures(context, "Title", c.work), c.done) << c.text.toStdString();
+        ASSERT_EQ(sink.shown.size(), c.title.isEmpty() ? 0 : 1) << c.text.toStdString();
+        if (c.title.isEmpty()) continue;
+        EXPECT_EQ(sink.shown[0].title, c.title);
+        EXPECT_EQ(sink.shown[0].text, c.text);
+        EXPECT_EQ(sink.shown[0].icon, MsgIcon::Critical);
+    }
 }
 
 }  // namespace

@@ -8,6 +8,7 @@
 #include <QStandardPaths>
 #include <QTemporaryDir>
 
+#include "platform/failure.h"
 #include "platform/printers.h"
 #include "platform/user_paths.h"
 
@@ -38,27 +39,32 @@ class FakeCups {
 TEST(PrintersTest, DestinationsComeFromCups) {
     FakeCups cups;
     cups.program("lpstat", "[ \"$1\" = -e ] || exit 9\nprintf 'HP_LaserJet\\nZebra_GK420\\n\\n'\n");
-    QString error;
-    EXPECT_EQ(installedPrinters(&error), (QStringList{"HP_LaserJet", "Zebra_GK420"}));
-    EXPECT_TRUE(error.isEmpty());
+    EXPECT_EQ(installedPrinters(), (QStringList{"HP_LaserJet", "Zebra_GK420"}));
 
     cups.program("lpstat", "echo 'lpstat: Scheduler is not running.' >&2\nexit 1\n");
-    EXPECT_TRUE(installedPrinters(&error).isEmpty());
-    EXPECT_TRUE(error.contains("Scheduler is not running")) << error.toStdString();
+    try {
+        installedPrinters();
+        ADD_FAILURE() << "no printers without a scheduler";
+    } catch (const Failure& e) {
+        EXPECT_TRUE(e.description().contains("Scheduler is not running"));
+    }
 }
 
 TEST(PrintersTest, TheChosenPrinterBecomesTheDefault) {
     FakeCups cups;
     cups.program("lpoptions", QStringLiteral("echo \"$@\" > %1\n").arg(cups.log()).toLocal8Bit());
-    QString error;
-    ASSERT_TRUE(setDefaultPrinter("Zebra_GK420", &error)) << error.toStdString();
+    setDefaultPrinter("Zebra_GK420");
     QFile log(cups.log());
     ASSERT_TRUE(log.open(QIODevice::ReadOnly));
     EXPECT_EQ(log.readAll(), "-d Zebra_GK420\n");
 
     cups.program("lpoptions", "echo 'lpoptions: Unknown printer or class.' >&2\nexit 1\n");
-    EXPECT_FALSE(setDefaultPrinter("Nowhere", &error));
-    EXPECT_TRUE(error.contains("Unknown printer")) << error.toStdString();
+    try {
+        setDefaultPrinter("Nowhere");
+        ADD_FAILURE() << "an unknown printer is refused";
+    } catch (const Failure& e) {
+        EXPECT_TRUE(e.description().contains("Unknown printer"));
+    }
 }
 
 TEST(UserPathsTest, FoldersOfTheUser) {

@@ -9,11 +9,14 @@
 
 #include "jet/database.h"
 #include "jet/recordset.h"
-#include "process_run.h"
+#include "support/process_run.h"
 #include "support/qt_print.h"
 
 namespace etq::print::test {
 namespace {
+
+using etq::test::ProcessResult;
+using etq::test::runProcess;
 
 class CliPrintTest : public ::testing::Test {
   protected:

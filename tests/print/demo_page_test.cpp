@@ -12,12 +12,15 @@
 
 #include "jet/database.h"
 #include "jet/recordset.h"
-#include "process_run.h"
+#include "support/process_run.h"
 #include "support/qt_print.h"
 #include "support/test_env.h"
 
 namespace etq::print::test {
 namespace {
+
+using etq::test::ProcessResult;
+using etq::test::runProcess;
 
 QString lastLine(const QString& text) {
     return text.trimmed().split(u'\n').last().trimmed();

@@ -4,7 +4,7 @@
 #include <QString>
 #include <QStringList>
 
-namespace etq::print::test {
+namespace etq::test {
 
 // What a program run by a test said and how it ended.
 struct ProcessResult {
@@ -33,4 +33,4 @@ inline ProcessResult runProcess(
     return result;
 }
 
-}  // namespace etq::print::test
+}  // namespace etq::test
