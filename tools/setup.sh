@@ -4,14 +4,12 @@
 set -euo pipefail
 
 packages=(
-    # build
+    # build (Qt's CMake modules look for some of their parts with pkg-config)
     g++ cmake ninja-build pkg-config clang-format
     # libraries
     qt6-base-dev libgl-dev libsqlite3-dev libzint-dev
-    unixodbc-dev libsqliteodbc tdsodbc
-    # tests and benchmarks
-    googletest libgtest-dev libgmock-dev libbenchmark-dev
-    sqlite3 zint zbar-tools python3 python3-dbfread
+    # tests and benchmarks: GoogleTest, and the independent tools the tests check against
+    libgtest-dev sqlite3 zint zbar-tools python3 python3-dbfread
     # desktop stand-ins: printers, Hebrew fonts, a display for screenshots, a browser
     cups-client culmus fonts-dejavu-core xvfb xauth chromium
 )
