@@ -1,5 +1,6 @@
 #include "surface/settings_groups.h"
 
+#include "platform/log.h"
 #include "platform/settings_store.h"
 
 namespace etq {
@@ -17,7 +18,8 @@ void moveKey(const Surface& surface, SettingsStore& store, quint8 action, const 
         GetSetParam(action, store, entry.section.toString(), key,
                     surface.control(entry.control.toString(), index), entry.kind,
                     defaultValue(entry));
-    } catch (const SurfaceError&) {
+    } catch (const SurfaceError& e) {
+        qCDebug(log::settings) << "skipped" << entry.section << key << ":" << e.message();
     }
 }
 
