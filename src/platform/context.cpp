@@ -3,7 +3,7 @@
 #include "platform/browser.h"
 #include "platform/captions.h"
 #include "platform/messages.h"
-#include "platform/settings_keys.h"
+#include "shell/settings_groups.h"  // (the key table moves to platform/settings_keys.h)
 
 namespace etq {
 
