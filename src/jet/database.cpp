@@ -343,6 +343,11 @@ Recordset Database::openRecordset(const QString& source) {
     return Recordset(Recordset::Impl::forQuery(conn_, saved.isEmpty() ? source : saved));
 }
 
+void Database::setCacheSize(int mebibytes) {
+    if (mebibytes < 1) fail(err::kInvalidArgument, "A cache needs at least 1 MiB.");
+    connection().exec(QString("PRAGMA main.cache_size = -%1").arg(qint64(mebibytes) * 1024));
+}
+
 void Database::beginTrans() {
     Connection& c = connection();
     c.exec(c.transactionDepth == 0 ? QString("BEGIN")
