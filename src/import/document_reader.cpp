@@ -1,13 +1,16 @@
 #include "import/document_reader.h"
 
 #include <QFileInfo>
+#include <limits>
 #include <optional>
+#include <span>
 
 #include "db/db_values.h"
 #include "import/host_reading.h"
 #include "import/public_functions.h"
 #include "import/scan_ranges.h"
 #include "jet/error.h"
+#include "jet/row_appender.h"
 #include "jet/vb.h"
 #include "platform/context.h"
 #include "platform/progress.h"
@@ -21,6 +24,9 @@ namespace doc = host::stockdoc;
 namespace line = host::stockdoc::line;
 
 constexpr int kProgressEvery = 5;
+// A large file's documents fill a working database of a hundred megabytes and more in one
+// transaction; pages kept in memory need not be written and synced half-way.
+constexpr int kScanCacheMiB = 256;
 constexpr int kScanningDocuments = 45;
 // Transfers between warehouses name no customer: their contact name is not taken.
 constexpr qint16 kTransferType = 12;
@@ -83,58 +89,104 @@ QDate hostDate(const DbfFile& file, qint64 record, FixedField field) {
     return QDate(parts[0], parts[1], parts[2]);
 }
 
-QVariant dateOrNull(QDate date) {
-    return date.isValid() ? QVariant(date) : QVariant();
+// The number a dBASE numeric field holds, read straight from its bytes: blanks, a sign, digits,
+// a point and digits, blanks. Nothing for a blank field or one that holds anything else. The
+// digits and the power of ten are exact doubles, so their quotient is the nearest double to the
+// text, as a conversion of the text gives it.
+std::optional<double> fieldNumber(QByteArrayView bytes) {
+    static constexpr double kPowers[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                         1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+    qsizetype i = 0;
+    const qsizetype n = bytes.size();
+    while (i < n && bytes[i] == ' ')
+        ++i;
+    const bool negative = i < n && bytes[i] == '-';
+    if (i < n && (bytes[i] == '-' || bytes[i] == '+')) ++i;
+    qint64 digits = 0;
+    int count = 0, decimals = 0;
+    bool point = false;
+    for (; i < n; ++i) {
+        const char c = bytes[i];
+        if (c >= '0' && c <= '9') {
+            digits = digits * 10 + (c - '0');
+            decimals += point;
+            if (++count > 15) return std::nullopt;
+        } else if (c == '.' && !point) {
+            point = true;
+        } else {
+            break;
+        }
+    }
+    while (i < n && (bytes[i] == ' ' || bytes[i] == '\0'))
+        ++i;
+    if (i != n || count == 0) return std::nullopt;
+    const double value = double(digits) / kPowers[decimals];
+    return negative ? -value : value;
 }
 
-int fieldIndex(const jet::Recordset& recordset, const char* name) {
-    const int index = recordset.fieldIndex(QString::fromLatin1(name));
-    if (index < 0)
-        jet::fail(jet::err::kItemNotFound,
-                  QStringLiteral("Item not found in this collection: %1.").arg(name));
-    return index;
+// A line's quantity: 0 when blank; a text no dBASE writer makes is read as Val reads it.
+double quantityOf(const DbfFile& file, qint64 record, FixedField field) {
+    if (const std::optional<double> number = fieldNumber(file.bytes(record, field))) return *number;
+    return vb::val(QStringView(file.text(record, field)));
 }
 
-struct HeaderFields {
-    explicit HeaderFields(const jet::Recordset& rs)
-        : wizFileId(fieldIndex(rs, "WizFileID")),
-          number(fieldIndex(rs, "Number")),
-          recIndex(fieldIndex(rs, "RecIndex")),
-          docType(fieldIndex(rs, "DocType")),
-          reference(fieldIndex(rs, "Reference1")),
-          date(fieldIndex(rs, "DocDate")),
-          dueDate(fieldIndex(rs, "DocDueDate")),
-          accountKey(fieldIndex(rs, "AccountKey")),
-          cardName(fieldIndex(rs, "CardName")),
-          address(fieldIndex(rs, "Address")),
-          numAtCard(fieldIndex(rs, "NumAtCard")),
-          contactName(fieldIndex(rs, "CntctName")),
-          comments(fieldIndex(rs, "Comments")),
-          copies(fieldIndex(rs, "Copies")),
-          crates(fieldIndex(rs, "TotalCrates")),
-          include(fieldIndex(rs, "Include")),
-          isDraft(fieldIndex(rs, "IsDraft")) {}
-    int wizFileId, number, recIndex, docType, reference, date, dueDate, accountKey, cardName,
-        address, numAtCard, contactName, comments, copies, crates, include, isDraft;
+// The fields the reader writes, by the index the appenders know them by.
+namespace header {
+enum Field {
+    WizFileID,
+    Number,
+    RecIndex,
+    DocType,
+    Reference1,
+    DocDate,
+    DocDueDate,
+    AccountKey,
+    CardName,
+    Address,
+    NumAtCard,
+    CntctName,
+    Comments,
+    Copies,
+    TotalCrates,
+    Include,
+    IsDraft,
+    FieldCount
 };
+constexpr const char* kNames[] = {
+    "WizFileID",  "Number",     "RecIndex",    "DocType", "Reference1", "DocDate",
+    "DocDueDate", "AccountKey", "CardName",    "Address", "NumAtCard",  "CntctName",
+    "Comments",   "Copies",     "TotalCrates", "Include", "IsDraft"};
+static_assert(std::size(kNames) == FieldCount);
+}  // namespace header
 
-struct LineFields {
-    explicit LineFields(const jet::Recordset& rs)
-        : wizFileId(fieldIndex(rs, "WizFileID")),
-          headNumber(fieldIndex(rs, "HeadNumber")),
-          lineNum(fieldIndex(rs, "LineNum")),
-          number(fieldIndex(rs, "Number")),
-          itemKey(fieldIndex(rs, "ItemKey")),
-          itemName(fieldIndex(rs, "ItemName")),
-          quantity(fieldIndex(rs, "Quantity")),
-          warehouse(fieldIndex(rs, "Warehouse")),
-          copies(fieldIndex(rs, "Copies")),
-          include(fieldIndex(rs, "Include")),
-          serialNum(fieldIndex(rs, "SerialNum")),
-          vendorNum(fieldIndex(rs, "VendorNum")) {}
-    int wizFileId, headNumber, lineNum, number, itemKey, itemName, quantity, warehouse, copies,
-        include, serialNum, vendorNum;
+namespace lines {
+enum Field {
+    WizFileID,
+    HeadNumber,
+    LineNum,
+    Number,
+    ItemKey,
+    ItemName,
+    Quantity,
+    Warehouse,
+    Copies,
+    Include,
+    SerialNum,
+    VendorNum,
+    FieldCount
 };
+constexpr const char* kNames[] = {"WizFileID", "HeadNumber", "LineNum",   "Number",
+                                  "ItemKey",   "ItemName",   "Quantity",  "Warehouse",
+                                  "Copies",    "Include",    "SerialNum", "VendorNum"};
+static_assert(std::size(kNames) == FieldCount);
+}  // namespace lines
+
+QStringList fieldNames(std::span<const char* const> names) {
+    QStringList list;
+    for (const char* name : names)
+        list << QString::fromLatin1(name);
+    return list;
+}
 
 // What decides whether a record is read, taken from the record once.
 struct RecordHead {
@@ -143,22 +195,27 @@ struct RecordHead {
     bool draft = false;
 };
 
+// Writes the documents of one file. A record's header and lines are written together after it
+// has been read whole, so a record that cannot be read leaves nothing of itself.
 class DocumentScan {
   public:
     DocumentScan(jet::Database& db, const StockDocReadOptions& options)
         : options_(options),
-          headers_(db.openRecordset(QStringLiteral("tTempDocHeaders"))),
-          lines_(db.openRecordset(QStringLiteral("tTempDocLines"))),
-          headerFields_(headers_),
-          lineFields_(lines_) {}
+          headers_(db, QStringLiteral("tTempDocHeaders"), fieldNames(header::kNames),
+                   jet::RowAppender::SkipDuplicateKeys),
+          lines_(db, QStringLiteral("tTempDocLines"), fieldNames(lines::kNames),
+                 jet::RowAppender::SkipDuplicateKeys) {}
 
     void read(const DbfFile& file, qint64 record) {
         if (file.isDeleted(record)) return;
         const std::optional<RecordHead> head = admitted(file, record);
         if (!head) return;
         const qint32 number = wholeNumber32(file, record, doc::kNumber);
-        if (addHeader(file, record, number, *head)) ++scan_.headers;
+        addHeader(file, record, number, *head);
         addLines(file, record, number);
+        // A continuation record's header is there already: it is passed over.
+        scan_.headers += headers_.write();
+        scan_.lines += lines_.write();
     }
 
     StockDocScan& result() { return scan_; }
@@ -180,33 +237,32 @@ class DocumentScan {
     }
 
     // A text read from the host goes in only when there is one: a text field holds no empty text.
-    static void setIfGiven(jet::Recordset& rs, int field, const QString& text) {
-        if (!text.isEmpty()) rs.setValue(field, text);
+    static void setIfGiven(jet::RowAppender& rows, int field, const QString& text) {
+        if (!text.isEmpty()) rows.setText(field, text);
     }
 
-    bool addHeader(const DbfFile& file, qint64 record, qint32 number, const RecordHead& head) {
-        const HeaderFields& f = headerFields_;
-        headers_.addNew();
-        headers_.setValue(f.wizFileId, options_.wizFileType);
-        headers_.setValue(f.number, number);
-        headers_.setValue(f.recIndex, record);
-        headers_.setValue(f.docType, options_.wizFileType);
-        headers_.setValue(f.reference, head.reference);
-        headers_.setValue(f.date, head.date);
-        headers_.setValue(f.dueDate, dateOrNull(hostDate(file, record, doc::kDueDate)));
-        setIfGiven(headers_, f.accountKey, QuoteToApostrophe(file.text(record, doc::kAccountKey)));
-        setIfGiven(headers_, f.cardName,
-                   db::RemoveQuoteChars(file.text(record, doc::kCustomerName)));
-        setIfGiven(headers_, f.address, addressText(file.text(record, doc::kAddress)));
-        setIfGiven(headers_, f.numAtCard, file.text(record, doc::kCustomerReference));
+    void addHeader(const DbfFile& file, qint64 record, qint32 number, const RecordHead& head) {
+        using namespace header;
+        jet::RowAppender& h = headers_;
+        h.setNumber(WizFileID, options_.wizFileType);
+        h.setNumber(Number, number);
+        h.setNumber(RecIndex, record);
+        h.setNumber(DocType, options_.wizFileType);
+        h.setNumber(Reference1, head.reference);
+        h.setDate(DocDate, head.date);
+        h.setDate(DocDueDate, hostDate(file, record, doc::kDueDate));
+        setIfGiven(h, AccountKey, QuoteToApostrophe(file.text(record, doc::kAccountKey)));
+        setIfGiven(h, CardName, db::RemoveQuoteChars(file.text(record, doc::kCustomerName)));
+        setIfGiven(h, Address, addressText(file.text(record, doc::kAddress)));
+        setIfGiven(h, NumAtCard, file.text(record, doc::kCustomerReference));
         if (options_.wizFileType != kTransferType)
-            setIfGiven(headers_, f.contactName, file.text(record, doc::kContactName));
-        setIfGiven(headers_, f.comments, file.text(record, doc::kRemarks));
-        headers_.setValue(f.copies, 1);
-        headers_.setValue(f.crates, 1);
-        headers_.setValue(f.include, options_.fastWay);
-        headers_.setValue(f.isDraft, head.draft);
-        return updateUnlessDuplicate(headers_);
+            setIfGiven(h, CntctName, file.text(record, doc::kContactName));
+        setIfGiven(h, Comments, file.text(record, doc::kRemarks));
+        h.setNumber(Copies, 1);
+        h.setNumber(TotalCrates, 1);
+        h.setYesNo(Include, options_.fastWay);
+        h.setYesNo(IsDraft, head.draft);
+        h.addRow();
     }
 
     QString addressText(QString address) const {
@@ -220,43 +276,40 @@ class DocumentScan {
         for (int slot = 1; slot <= doc::kLinesPerRecord; ++slot) {
             const QString key =
                 QuoteToApostrophe(file.text(record, doc::slot(slot, line::kItemKey)));
-            if (key.isEmpty()) continue;
-            if (addLine(file, record, number, page * doc::kLinesPerRecord + slot, slot, key))
-                ++scan_.lines;
+            if (!key.isEmpty())
+                addLine(file, record, number, page * doc::kLinesPerRecord + slot, slot, key);
         }
     }
 
-    bool addLine(const DbfFile& file, qint64 record, qint32 number, int lineNumber, int slot,
+    void addLine(const DbfFile& file, qint64 record, qint32 number, int lineNumber, int slot,
                  const QString& key) {
-        const LineFields& f = lineFields_;
-        const QString quantityText = file.text(record, doc::slot(slot, line::kQuantity));
-        const double quantity = vb::val(QStringView(quantityText));
-        lines_.addNew();
-        lines_.setValue(f.wizFileId, options_.wizFileType);
-        lines_.setValue(f.headNumber, number);
-        lines_.setValue(f.lineNum, lineNumber);
-        lines_.setValue(f.number, record);
-        lines_.setValue(f.itemKey, key);
-        setIfGiven(lines_, f.itemName, file.text(record, doc::slot(slot, line::kItemName)));
-        lines_.setValue(f.quantity, quantity);
-        lines_.setValue(f.include, true);
-        lines_.setValue(f.copies, db::CopiesFromQuantity(quantity));
-        setIfGiven(lines_, f.serialNum, file.text(record, doc::slot(slot, line::kSerialNumber)));
-        setIfGiven(lines_, f.vendorNum,
-                   file.text(record, doc::slot(slot, line::kVendorCatalogNumber)));
-        if (const auto warehouse =
-                vb::toInteger(file.text(record, doc::slot(slot, line::kWarehouse))))
-            lines_.setValue(f.warehouse, *warehouse);
-        return updateUnlessDuplicate(lines_);
+        using namespace lines;
+        jet::RowAppender& l = lines_;
+        const double quantity = quantityOf(file, record, doc::slot(slot, line::kQuantity));
+        l.setNumber(WizFileID, options_.wizFileType);
+        l.setNumber(HeadNumber, number);
+        l.setNumber(LineNum, lineNumber);
+        l.setNumber(Number, record);
+        l.setText(ItemKey, key);
+        setIfGiven(l, ItemName, file.text(record, doc::slot(slot, line::kItemName)));
+        l.setDouble(Quantity, quantity);
+        l.setNumber(Copies, db::CopiesFromQuantity(quantity));
+        l.setYesNo(Include, true);
+        setIfGiven(l, SerialNum, file.text(record, doc::slot(slot, line::kSerialNumber)));
+        setIfGiven(l, VendorNum, file.text(record, doc::slot(slot, line::kVendorCatalogNumber)));
+        if (const auto number = fieldNumber(file.bytes(record, doc::slot(slot, line::kWarehouse))))
+            if (const auto warehouse = vb::toInteger(*number)) l.setNumber(Warehouse, *warehouse);
+        l.addRow();
     }
 
     const StockDocReadOptions& options_;
-    jet::Recordset headers_;
-    jet::Recordset lines_;
-    HeaderFields headerFields_;
-    LineFields lineFields_;
+    jet::RowAppender headers_;
+    jet::RowAppender lines_;
     StockDocScan scan_;
 };
+
+// Opening a file from beyond its last record reads its header alone.
+constexpr qint64 kHeaderOnly = std::numeric_limits<qint64>::max();
 
 }  // namespace
 
@@ -269,12 +322,18 @@ StockDocScan readStockDocuments(const StockDocReadOptions& options, Context& con
     const QString path = hostFilePath(options.companyFolder, def.fileName);
     if (!QFileInfo::exists(path)) return {};
 
-    const DbfFile file = openHostFile(path, doc::kLayout);
+    // The header says how many records there are, and so where the scan starts; only the
+    // records from there on are read.
+    const qint64 header = DbfFile(path, kHeaderOnly).recordCount();
+    if (header == 0) return {};
+    const DbfFile file(path,
+                       options.fromNumber == 0 ? firstRecordToScan(def.nextStart, header) : 0);
+    host::requireLayout(file, doc::kLayout);
     const qint64 count = file.recordCount();
-    if (count == 0) return {};
+    const qint64 first = file.firstRecord();
 
+    db.setCacheSize(kScanCacheMiB);
     DocumentScan scan(db, options);
-    const qint64 first = options.fromNumber == 0 ? firstRecordToScan(def.nextStart, count) : 0;
     KeptWrites writes(db);
     qint64 visited = 0;
     for (qint64 record = first; record < count; ++record) {
