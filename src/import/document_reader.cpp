@@ -311,6 +311,38 @@ class DocumentScan {
 // Opening a file from beyond its last record reads its header alone.
 constexpr qint64 kHeaderOnly = std::numeric_limits<qint64>::max();
 
+// The records a scan reads: from where the stored position says for the records the file has
+// now, or from the first when a from number is given. Nothing when the file has no records.
+std::optional<DbfFile> openForScan(const QString& path, const StockDocReadOptions& options,
+                                   qint64 nextStart) {
+    const qint64 records = DbfFile(path, kHeaderOnly).recordCount();
+    if (records == 0) return std::nullopt;
+    DbfFile file(path, options.fromNumber == 0 ? firstRecordToScan(nextStart, records) : 0);
+    host::requireLayout(file, doc::kLayout);
+    return file;
+}
+
+StockDocScan scanRecords(jet::Database& db, const DbfFile& file, const StockDocReadOptions& options,
+                         Progress& progress) {
+    db.setCacheSize(kScanCacheMiB);
+    DocumentScan scan(db, options);
+    KeptWrites writes(db);
+    const qint64 count = file.recordCount();
+    qint64 visited = 0;
+    for (qint64 record = file.firstRecord(); record < count; ++record) {
+        scan.read(file, record);
+        if (++visited % kProgressEvery == 0) progress.show(record, count);
+    }
+    if (options.toNumber == 0 && !options.toNumberEntered)
+        storePosition(db, options.wizFileType, count);
+    writes.commit();
+
+    StockDocScan result = scan.result();
+    result.recordCount = count;
+    result.firstRecord = file.firstRecord();
+    return result;
+}
+
 }  // namespace
 
 StockDocScan readStockDocuments(const StockDocReadOptions& options, Context& context,
@@ -321,34 +353,11 @@ StockDocScan readStockDocuments(const StockDocReadOptions& options, Context& con
     const DocumentFileDef def = readFileDef(db, options.wizFileType);
     const QString path = hostFilePath(options.companyFolder, def.fileName);
     if (!QFileInfo::exists(path)) return {};
-
-    // The header says how many records there are, and so where the scan starts; only the
-    // records from there on are read.
-    const qint64 header = DbfFile(path, kHeaderOnly).recordCount();
-    if (header == 0) return {};
-    const DbfFile file(path,
-                       options.fromNumber == 0 ? firstRecordToScan(def.nextStart, header) : 0);
-    host::requireLayout(file, doc::kLayout);
-    const qint64 count = file.recordCount();
-    const qint64 first = file.firstRecord();
-
-    db.setCacheSize(kScanCacheMiB);
-    DocumentScan scan(db, options);
-    KeptWrites writes(db);
-    qint64 visited = 0;
-    for (qint64 record = first; record < count; ++record) {
-        scan.read(file, record);
-        if (++visited % kProgressEvery == 0) progress.show(record, count);
-    }
-    if (options.toNumber == 0 && !options.toNumberEntered)
-        storePosition(db, options.wizFileType, count);
-    writes.commit();
+    const std::optional<DbfFile> file = openForScan(path, options, def.nextStart);
+    if (!file) return {};
+    const StockDocScan scan = scanRecords(db, *file, options, progress);
     progress.clear();
-
-    StockDocScan result = scan.result();
-    result.recordCount = count;
-    result.firstRecord = first;
-    return result;
+    return scan;
 }
 
 }  // namespace etq
