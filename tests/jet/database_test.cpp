@@ -126,15 +126,6 @@ TEST_F(DatabaseTest, FieldRulesNeedNoTemporaryTableAndNumbersRefuseText) {
               QStringList({"k2|2", "k2.5|2.5", "kNull|Null"}));
 }
 
-TEST_F(DatabaseTest, CacheSizeIsSetInMebibytes) {
-    Database db = create("a.kdb");
-    db.setCacheSize(64);
-    detail::Stmt size = db.connection().prepare("PRAGMA main.cache_size", false);
-    ASSERT_TRUE(size.step());
-    EXPECT_EQ(size.column(0).toLongLong(), -64 * 1024);
-    EXPECT_JET_ERROR(err::kInvalidArgument, db.setCacheSize(0));
-}
-
 TEST_F(DatabaseTest, ExecuteSkipsFailingRowsUnlessToldToFail) {
     Database db = create("a.kdb");
     db.createTable(
