@@ -102,6 +102,18 @@ bool isTrue(const QVariant& value) {
     return !value.isNull() && value.toBool();
 }
 
+// Reads the type of the current row of the type query, then the items when asked. False when
+// the items step failed and the user chose not to go on.
+bool scanType(const DocImportOptions& options, const QString& workDb, const jet::Recordset& types,
+              Context& context, Progress& progress, DocImportResult& result) {
+    const bool drafts = isTrue(types.value(QStringLiteral("IncludeDraft")));
+    DocTypeRead& read = result.types.emplace_back(
+        readType(readerOptions(options, workDb, docTypeOf(types), drafts), context, progress));
+    if (read.scan.recordCount == 0 || !options.readItems) return true;
+    read.itemsImported = options.importItems();
+    return read.itemsImported || continueAnyway(context);
+}
+
 }  // namespace
 
 DocImportResult importDocuments(const DocImportOptions& options, Context& context,
@@ -118,21 +130,11 @@ DocImportResult importDocuments(const DocImportOptions& options, Context& contex
     jet::Database work = jet::Database::open(files.work);
     for (jet::Recordset types = work.openRecordset(kTypesToScan); !types.eof(); types.moveNext()) {
         if (!isTrue(types.value(QStringLiteral("Include")))) continue;
-        const bool drafts = isTrue(types.value(QStringLiteral("IncludeDraft")));
-        DocTypeRead read = readType(readerOptions(options, files.work, docTypeOf(types), drafts),
-                                    context, progress);
-        const bool gaveRecords = read.scan.recordCount != 0;
-        if (gaveRecords && options.readItems) {
-            read.itemsImported = options.importItems();
-            if (!read.itemsImported && !continueAnyway(context)) {
-                result.types.append(read);
-                result.stopped = true;
-                return result;
-            }
+        if (!scanType(options, files.work, types, context, progress, result)) {
+            result.stopped = true;
+            return result;
         }
-        result.types.append(read);
     }
-    work.close();
     progress.fill();
     progress.step(context.caption(kScanIsFinished));
     return result;
