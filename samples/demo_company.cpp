@@ -302,6 +302,17 @@ QList<StockDocument> makeDocuments(const DemoDocumentFile& file, const QList<Ite
     }
     // A few drafts (one with a blank mark), one record the host marked "I", one deleted.
     documents[3].draftMark = QStringLiteral("Y");
+    // Quantities a label run must cope with: a weighed return, a bulk line beyond 999 labels,
+    // a line of nothing; and an item the shop's item file no longer holds.
+    if (file.wizFileId == 1) {
+        QList<DocumentLine>& lines = documents[1].lines;
+        lines[2].quantity = -3.6;
+        lines[5].quantity = 2500;
+        lines[7].quantity = 0;
+        lines[8].itemKey = QStringLiteral("99999");
+        lines[8].itemName = QStringLiteral("מארז שי לחג (הופסק)");
+        lines[8].vendorCatalogNumber.clear();
+    }
     if (file.wizFileId == 4) documents[5].draftMark = QString();
     if (file.wizFileId == 2) documents[3].status = QStringLiteral("I");
     if (file.wizFileId == 1) documents[5].deleted = true;

@@ -2,6 +2,7 @@
 
 #include <QFileInfo>
 
+#include "import/host_reading.h"
 #include "platform/settings_keys.h"
 #include "platform/settings_store.h"
 #include "platform/user_paths.h"
@@ -65,7 +66,7 @@ void SetGetRegConnParams(const QString& application, quint8 action, QString& ser
 
 bool companyFolderHasAccounts(const QString& server, const QString& database) {
     const QString folder = BuildConnString(server, {}, {}, database, 3);
-    return QFileInfo(joinPath(folder, QStringLiteral("ocrd.dbf"))).isFile();
+    return QFileInfo(hostread::hostFilePath(folder, host::ocrd::kLayout)).isFile();
 }
 
 }  // namespace etq

@@ -45,6 +45,36 @@ DbfFile::DbfFile(const QString& path) : path_(path) {
     readFieldDescriptors();
 }
 
+DbfFile::DbfFile(const QString& path, qint64 firstRecord) : path_(path) {
+    QFile file(path_);
+    if (!file.open(QIODevice::ReadOnly))
+        throw DbfError(QStringLiteral("Cannot open %1: %2").arg(path_, file.errorString()));
+    const qint64 size = file.size();
+    contents_ = file.read(kFileHeaderSize);
+    if (contents_.size() < kFileHeaderSize)
+        fail(QStringLiteral("it is %1 bytes long, shorter than a dBASE header (32 bytes)")
+                 .arg(contents_.size()));
+    contents_ += file.read(qMax(0, int(u16At(contents_.constData() + 8)) - kFileHeaderSize));
+    readHeader(size);
+    if (contents_.size() < headerLength_) fail(QStringLiteral("it ends inside its header"));
+    readFieldDescriptors();
+
+    firstRecord_ = qBound<qint64>(0, firstRecord, recordCount_);
+    const qint64 wanted = (recordCount_ - firstRecord_) * recordLength_;
+    QByteArray records;
+    if (wanted > 0 && file.seek(headerLength_ + firstRecord_ * recordLength_))
+        records = file.read(wanted);
+    if (file.error() != QFileDevice::NoError)
+        throw DbfError(QStringLiteral("Cannot read %1: %2").arg(path_, file.errorString()));
+    if (records.size() < wanted)
+        fail(QStringLiteral("it ended after %1 of the %2 bytes of records %3 to %4")
+                 .arg(records.size())
+                 .arg(wanted)
+                 .arg(firstRecord_ + 1)
+                 .arg(recordCount_));
+    contents_ += records;
+}
+
 DbfFile::~DbfFile() = default;
 DbfFile::DbfFile(DbfFile&&) noexcept = default;
 DbfFile& DbfFile::operator=(DbfFile&&) noexcept = default;

@@ -50,12 +50,17 @@ class DbfFile {
   public:
     // Opens and validates `path`; throws DbfError.
     explicit DbfFile(const QString& path);
+    // The same, reading only the records from `firstRecord` (0-based) on: a scan that goes on
+    // where the last one ended need not read a long file whole. The records before it cannot be
+    // accessed; a first record beyond the last reads none (the header only).
+    DbfFile(const QString& path, qint64 firstRecord);
     ~DbfFile();
     DbfFile(DbfFile&&) noexcept;
     DbfFile& operator=(DbfFile&&) noexcept;
 
     const QString& path() const { return path_; }
     qint64 recordCount() const { return recordCount_; }
+    qint64 firstRecord() const { return firstRecord_; }  // the first record read
     int headerLength() const { return headerLength_; }
     int recordLength() const { return recordLength_; }
     const QList<DbfField>& fields() const { return fields_; }
@@ -93,16 +98,18 @@ class DbfFile {
     void readFieldDescriptors();
     [[noreturn]] void fail(const QString& what) const;
     const char* at(qint64 record, int offset, int width) const {
-        if (record < 0 || record >= recordCount_ || offset < 0 || width < 0 ||
+        if (record < firstRecord_ || record >= recordCount_ || offset < 0 || width < 0 ||
             offset > recordLength_ - width)
             failAccess(record, offset, width);
-        return contents_.constData() + headerLength_ + record * recordLength_ + offset;
+        return contents_.constData() + headerLength_ + (record - firstRecord_) * recordLength_ +
+               offset;
     }
     [[noreturn]] void failAccess(qint64 record, int offset, int width) const;
 
     QString path_;
     QByteArray contents_;
     qint64 recordCount_ = 0;
+    qint64 firstRecord_ = 0;  // the first record read into contents_, after the header
     int headerLength_ = 0;
     int recordLength_ = 0;
     QList<DbfField> fields_;

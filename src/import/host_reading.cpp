@@ -1,5 +1,7 @@
 #include "import/host_reading.h"
 
+#include <QDir>
+#include <QFileInfo>
 #include <limits>
 #include <optional>
 
@@ -33,8 +35,21 @@ Whole wholeNumber(const DbfFile& file, qint64 record, const host::HostField& fie
 
 }  // namespace
 
+QString hostFilePath(const QString& companyFolder, const QString& fileName) {
+    const QString asked = db::inFolder(companyFolder, fileName);
+    if (QFileInfo::exists(asked)) return asked;
+    const QStringList entries =
+        QDir(companyFolder)
+            .entryList(QDir::AllEntries | QDir::System | QDir::Hidden | QDir::NoDotAndDotDot,
+                       QDir::Name);
+    for (const QString& entry : entries)
+        if (entry.compare(fileName, Qt::CaseInsensitive) == 0)
+            return db::inFolder(companyFolder, entry);
+    return asked;
+}
+
 QString hostFilePath(const QString& companyFolder, const host::HostLayout& layout) {
-    return db::inFolder(companyFolder, latin1(layout.fileName));
+    return hostFilePath(companyFolder, latin1(layout.fileName));
 }
 
 DbfFile openHostFile(const QString& path, const host::HostLayout& layout) {

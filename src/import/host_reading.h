@@ -25,7 +25,12 @@ inline const QString kLocalCurrency = QStringLiteral("\u00A6");  // "¦"
 // The sign labels show for the local currency, whatever sign the host keeps for it.
 inline const QString kLocalCurrencySign = QStringLiteral("\u20AA");  // "₪"
 
-// The host file of `layout` in the company folder.
+// The host file called `fileName` in the company folder, whatever the letter case of the name
+// on disk: a company folder copied from Windows holds OITM.DBF or Oitm.dbf. A name spelt
+// exactly as asked wins; otherwise the first entry, in name order, that differs only in case.
+// When there is none, the path as asked (which does not exist).
+QString hostFilePath(const QString& companyFolder, const QString& fileName);
+// The host file of `layout` in the company folder, found the same way.
 QString hostFilePath(const QString& companyFolder, const host::HostLayout& layout);
 
 // Opens a host file for a reader of `layout`. Throws DbfError when the file is damaged or its

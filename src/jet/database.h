@@ -64,6 +64,11 @@ class Database {
     // A recordset over a table, a saved select query or a SELECT statement.
     Recordset openRecordset(const QString& source);
 
+    // Memory for the pages of the file itself (its links keep theirs), in MiB; 16 until set. A
+    // run that writes a large table in one transaction gives it more, so that the engine does not
+    // write (and sync) pages half-way through the transaction.
+    void setCacheSize(int mebibytes);
+
     void beginTrans();
     void commitTrans();
     void rollback();

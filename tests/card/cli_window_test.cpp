@@ -37,15 +37,25 @@ class CliWindowTest : public ::testing::Test {
         resetSettings();
         demo::writeDemoCompany(dir.filePath("host/company"), {.items = 80, .seed = 9});
         SettingsStore store("Etiquon4");
-        const QStringList settings = {
-            "Params/ConnServer=" + dir.filePath("host"), "Params/ConnDataBase=company",
-            "ImportItems/PriceField=1", "ImportItems/Copies=3", "ImportItems/ReadPriceList=1",
-            "ImportItems/ImportAlterPrices=1", "ImportItems/FromItemKey=10010",
-            "ImportItems/ToItemKey=10060", "ImportItems/UseItmBelong=1",
-            "ImportItems/ItmBelong=0", "LabelVars/FldSend03=1", "LabelVars/PriceFormat=0.0",
-            "GeneralParams/OptPrinter1=True", "0LabelDef/UseCell=-1", "0LabelDef/FldID=1",
-            "1LabelDef/UseCell=-1", "1LabelDef/FldID=6", "DirectLabel/PageRows=3",
-            "DirectLabel/PageCols=2"};
+        const QStringList settings = {"Params/ConnServer=" + dir.filePath("host"),
+                                      "Params/ConnDataBase=company",
+                                      "ImportItems/PriceField=1",
+                                      "ImportItems/Copies=3",
+                                      "ImportItems/ReadPriceList=1",
+                                      "ImportItems/ImportAlterPrices=1",
+                                      "ImportItems/FromItemKey=10010",
+                                      "ImportItems/ToItemKey=10060",
+                                      "ImportItems/UseItmBelong=1",
+                                      "ImportItems/ItmBelong=0",
+                                      "LabelVars/FldSend03=1",
+                                      "LabelVars/PriceFormat=0.0",
+                                      "GeneralParams/OptPrinter1=True",
+                                      "0LabelDef/UseCell=-1",
+                                      "0LabelDef/FldID=1",
+                                      "1LabelDef/UseCell=-1",
+                                      "1LabelDef/FldID=6",
+                                      "DirectLabel/PageRows=3",
+                                      "DirectLabel/PageCols=2"};
         for (const QString& setting : settings) {
             const QString key = setting.section(u'=', 0, 0);
             store.write(key.section(u'/', 0, 0), key.section(u'/', 1), setting.section(u'=', 1));
@@ -85,18 +95,16 @@ class CliWindowTest : public ::testing::Test {
 };
 
 TEST_F(CliWindowTest, ImportAndPrintGiveTheSameRowsAndTheSamePage) {
-    const ProcessResult imported =
-        cli({"import-items", "--company", dir.filePath("host/company"), "--db",
-             dir.filePath("cli")});
+    const ProcessResult imported = cli(
+        {"import-items", "--company", dir.filePath("host/company"), "--db", dir.filePath("cli")});
     ASSERT_EQ(imported.exitCode, 0) << imported.err.toStdString();
     Window window(dir.filePath("window"));
     window.controller.click("CmdImportItems");
     ASSERT_TRUE(window.messages.shown.isEmpty()) << window.messages.shown[0].text.toStdString();
 
-    const QStringList itemTables = {
-        "SELECT * FROM tItems ORDER BY ItemKey",
-        "SELECT * FROM tPriceList ORDER BY ItemKey, PriceList",
-        "SELECT * FROM tAlterPrices ORDER BY AccountKey, ItemKey"};
+    const QStringList itemTables = {"SELECT * FROM tItems ORDER BY ItemKey",
+                                    "SELECT * FROM tPriceList ORDER BY ItemKey, PriceList",
+                                    "SELECT * FROM tAlterPrices ORDER BY AccountKey, ItemKey"};
     for (const QString& sql : itemTables) {
         const QStringList rows = table("cli", db::kItemDatabaseFile, sql);
         EXPECT_FALSE(rows.isEmpty()) << sql.toStdString();

@@ -3,6 +3,7 @@
 #include <QFile>
 #include <QProcess>
 
+#include "jet/connection.h"
 #include "jet_fixture.h"
 
 namespace etq::jet::test {
@@ -94,6 +95,35 @@ TEST_F(DatabaseTest, EachFieldRuleIsAnErrorWithItsNumber) {
     EXPECT_JET_ERROR(err::kUnknownField, db.openRecordset("SELECT Nothing FROM tItems"));
     EXPECT_JET_ERROR(err::kAlreadyExists, db.createTable(itemsDef()));
     EXPECT_JET_ERROR(err::kTableNotFound, db.openRecordset("tNothing"));
+}
+
+// The rules are checked on every row written, so they must stay cheap: none may make the
+// statement build a temporary table (SQLite does for a constant IN list of three or more). The
+// number rule still refuses a text and takes whole numbers, fractions and Null.
+TEST_F(DatabaseTest, FieldRulesNeedNoTemporaryTableAndNumbersRefuseText) {
+    Database db = create("a.kdb");
+    db.createTable(itemsDef());
+    detail::Stmt explain = db.connection().prepare(
+        "EXPLAIN INSERT INTO tItems (ItemKey, ItemName, ItemSort, Copies, PrintLabel, Price, "
+        "LastUpdate, Counter) VALUES ('1', 'a', 1, 1, -1, 2.5, 45000.5, 1)",
+        false);
+    QStringList opcodes;
+    while (explain.step())
+        opcodes << explain.column(1).toString();
+    EXPECT_TRUE(opcodes.contains("Insert"));
+    EXPECT_FALSE(opcodes.contains("OpenEphemeral"));
+
+    for (const char* value : {"2", "2.5", "Null"})
+        EXPECT_EQ(db.execute(QString("INSERT INTO tItems (ItemKey, Price, LastUpdate) VALUES "
+                                     "('k%1', %1, %1)")
+                                 .arg(value),
+                             Database::FailOnError),
+                  1)
+            << value;
+    EXPECT_EQ(db.execute("INSERT INTO tItems (ItemKey, Price) VALUES ('t', 'abc')"), 0);
+    EXPECT_EQ(db.execute("INSERT INTO tItems (ItemKey, LastUpdate) VALUES ('d', 'abc')"), 0);
+    EXPECT_EQ(rows(db, "SELECT ItemKey, Price FROM tItems ORDER BY ItemKey"),
+              QStringList({"k2|2", "k2.5|2.5", "kNull|Null"}));
 }
 
 TEST_F(DatabaseTest, ExecuteSkipsFailingRowsUnlessToldToFail) {
