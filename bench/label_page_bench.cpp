@@ -17,7 +17,6 @@
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "platform/browser.h"
-#include "platform/print_folder.h"
 #include "platform/settings_store.h"
 #include "print/barcode_images.h"
 #include "print/label_definition.h"
@@ -138,8 +137,8 @@ int main(int argc, char** argv) {
     SilentViewer viewer;
     setPageViewer(&viewer);
 
-    // Rounds as a user runs them: each print run first deletes the bitmaps of the one before.
-    // zint writes into an emptied folder each round.
+    // Rounds as a user runs them: each print run writes into a new folder of its own. zint
+    // writes into an emptied folder each round.
     constexpr int kRounds = 5;
     QList<double> runs;
     QList<double> zints;
@@ -154,11 +153,12 @@ int main(int argc, char** argv) {
         zints.append(zintSeconds(scratch.path(), labels));
         if (zints.last() < 0) return 1;
     }
-    const int bitmaps = int(QDir(printFolder()).entryList({"B*.BMP"}, QDir::Files).size());
+    const QString runFolder = QFileInfo(page).path();
+    const int bitmaps = int(QDir(runFolder).entryList({"B*.BMP"}, QDir::Files).size());
 
     // The parts alone: the bitmaps with one library instance, and the page.
     timer.restart();
-    MakeBarcodeImages(printFolder(), "BarCode", 4, workDb,
+    MakeBarcodeImages(runFolder, "BarCode", 4, workDb,
                       BuildLabelQuery(labelQueryInput(surface, ItemLabels, Ascending)), def.bar);
     const double images = timer.nsecsElapsed() / 1e9;
     timer.restart();

@@ -315,8 +315,8 @@ QString PrintBuiltInLabels(Surface& surface, const QString& dbName, quint8 query
         const quint8 orderBy = labelOrder(surface);
         // Built before the page ticks the cells' fields, as the page's own query is later.
         const QString sql = BuildLabelQuery(labelQueryInput(surface, queryType, orderBy));
-        const QString folder = printFolder();
-        deleteFilesIn(folder);
+        const PrintRunFolder run;
+        const QString folder = run.path();
 
         // Every barcode cell's values are read first, so that a failing query ends the run
         // before the page is begun.
