@@ -12,6 +12,8 @@ packages=(
     # tests and benchmarks
     googletest libgtest-dev libgmock-dev libbenchmark-dev
     sqlite3 zint zbar-tools python3 python3-dbfread
+    # dBASE files as other tools write them, for the reader's tests
+    python3-dbf shapelib
     # desktop stand-ins: printers, Hebrew fonts, a display for screenshots, a browser
     cups-client culmus fonts-dejavu-core xvfb xauth chromium
 )

@@ -7,7 +7,6 @@
 #include <QString>
 #include <exception>
 #include <optional>
-#include <stdexcept>
 
 #include "import/dbf_file.h"
 #include "import/host_layouts.h"
@@ -27,12 +26,8 @@ inline const QString kLocalCurrency = QStringLiteral("\u00A6");  // "¦"
 // The sign labels show for the local currency, whatever sign the host keeps for it.
 inline const QString kLocalCurrencySign = QStringLiteral("\u20AA");  // "₪"
 
-// A field of a host record that does not hold what it should: a group number that is no
-// number, say. The message names the file, the record and the field.
-class HostValueError : public std::runtime_error {
-  public:
-    explicit HostValueError(const QString& message) : std::runtime_error(message.toStdString()) {}
-};
+// A field of a host record that does not hold what it should (platform/failure.h).
+using HostValueError = etq::HostValueError;
 
 // The host file of `layout` in the company folder.
 QString hostFilePath(const QString& companyFolder, const host::HostLayout& layout);
