@@ -1,6 +1,5 @@
 #include "db/local_databases.h"
 
-#include <QFile>
 #include <QFileInfo>
 
 #include "db/file_names.h"
@@ -14,15 +13,6 @@ using jet::Database;
 using jet::JetError;
 
 namespace {
-
-// Creation replaces a file that is there.
-void removeExisting(const QString& path) {
-    if (!QFileInfo::exists(path)) return;
-    QFile file(path);
-    if (!file.remove())
-        jet::fail(jet::err::kCannotOpen,
-                  QString("Cannot replace '%1': %2.").arg(path, file.errorString()));
-}
 
 void reportEngineError(const JetError& e) {
     showCritical(e.description(), GetCaption(1));
@@ -44,6 +34,17 @@ void createQueries(Database& db, const schema::SavedQuery* queries, size_t count
         db.createQuery(queries[i].name, queries[i].sql);
 }
 
+void addItemTables(Database& db) {
+    for (const jet::TableDef* t : {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
+        db.createTable(*t);
+    createQueries(db, schema::kItemQueries, std::size(schema::kItemQueries));
+}
+
+void addAccountTables(Database& db) {
+    db.createTable(schema::accountDef());
+    db.createTable(schema::priceList());
+}
+
 }  // namespace
 
 void AttachTable(Database& db, const QString& sourcePath, const QString& tableName) {
@@ -53,8 +54,8 @@ void AttachTable(Database& db, const QString& sourcePath, const QString& tableNa
 QString CreateDocDatabase(const QString& docRefPath, const QString& itemDbPath,
                           const QString& workPath, const QString& logDbPath) {
     return created(workPath, [&] {
-        removeExisting(workPath);
-        Database db = Database::create(workPath);
+        jet::StagedDatabase staged(workPath);  // replaces a file that is there, once complete
+        Database& db = staged.database();
         db.createTable(schema::tempDocHeaders());
         db.createTable(schema::tempDocLines());
         db.createTable(schema::transports());
@@ -64,17 +65,24 @@ QString CreateDocDatabase(const QString& docRefPath, const QString& itemDbPath,
         }
         if (!logDbPath.isEmpty()) AttachTable(db, logDbPath, schema::stockLog().name);
         createQueries(db, schema::kWorkQueries, std::size(schema::kWorkQueries));
+        staged.commit();
     });
 }
 
 QString CreateItemDatabase(const QString& path) {
     return created(path, [&] {
-        removeExisting(path);
-        Database db = Database::create(path);
-        for (const jet::TableDef* t :
-             {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
-            db.createTable(*t);
-        createQueries(db, schema::kItemQueries, std::size(schema::kItemQueries));
+        jet::StagedDatabase staged(path);  // replaces a file that is there, once complete
+        addItemTables(staged.database());
+        staged.commit();
+    });
+}
+
+QString CreateItemDatabaseWithAccounts(const QString& path) {
+    return created(path, [&] {
+        jet::StagedDatabase staged(path);
+        addItemTables(staged.database());
+        addAccountTables(staged.database());
+        staged.commit();
     });
 }
 
@@ -86,21 +94,23 @@ QString AddAccountTables(const QString& path) {
     }
     return created(path, [&] {
         Database db = Database::open(path);
-        db.createTable(schema::accountDef());
-        db.createTable(schema::priceList());
+        db.beginTrans();  // both tables or neither, whenever the upgrade stops
+        addAccountTables(db);
+        db.commitTrans();
     });
 }
 
 QString CreateTempItemDatabase(const QString& tempPath, const QString& itemDbPath) {
     return created(tempPath, [&] {
-        removeExisting(tempPath);
-        Database db = Database::create(tempPath);
+        jet::StagedDatabase staged(tempPath);  // replaces a file that is there, once complete
+        Database& db = staged.database();
         for (const jet::TableDef* t : {&schema::tempItems(), &schema::tempAlterKeys(),
                                        &schema::tempAlterPrices(), &schema::tempPriceList()})
             db.createTable(*t);
         for (const char* table : schema::kTempItemLinks)
             AttachTable(db, itemDbPath, table);
         createQueries(db, schema::kTempItemQueries, std::size(schema::kTempItemQueries));
+        staged.commit();
     });
 }
 
@@ -115,9 +125,10 @@ void MergeTempItems(const QString& tempPath) {
 
 QString CreateLogDatabase(const QString& path) {
     return created(path, [&] {
-        removeExisting(path);
-        Database db = Database::create(path);
+        jet::StagedDatabase staged(path);  // replaces a file that is there, once complete
+        Database& db = staged.database();
         db.createTable(schema::stockLog());
+        staged.commit();
     });
 }
 
@@ -133,7 +144,29 @@ void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrice
 bool UpgradeItemDatabase(const QString& folder) {
     const QString path = inFolder(folder, kItemDatabaseFile);
     if (!QFileInfo::exists(path)) return true;
+    // Account tables added to a file without its items would make a broken file look upgraded.
+    if (const QString why = whyUnusable(path, itemTableNames()); !why.isEmpty()) {
+        showCritical(why, GetCaption(1));
+        return false;
+    }
     return !AddAccountTables(path).isEmpty();
+}
+
+QStringList itemTableNames() {
+    return {schema::items().name, schema::alterKeys().name, schema::alterPrices().name};
+}
+
+QString whyUnusable(const QString& path, const QStringList& tables) {
+    try {
+        Database db = Database::open(path);
+        QStringList missing;
+        for (const QString& table : tables)
+            if (!db.hasTable(table)) missing << table;
+        if (missing.isEmpty()) return {};
+        return QString("%1 lacks the tables %2").arg(path, missing.join(", "));
+    } catch (const JetError& e) {
+        return QString("%1 is damaged or not a database of Etiquon: %2").arg(path, e.description());
+    }
 }
 
 }  // namespace etq::db

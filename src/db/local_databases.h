@@ -1,14 +1,16 @@
 #pragma once
 
 #include <QString>
+#include <QStringList>
 #include <functional>
 
 #include "jet/database.h"
 
 // The creation routines of the component's databases. Each creating routine returns the path
 // it made, or an empty text after it has reported the failure (the engine's description,
-// caption 1 as title, the critical icon). A half-built file stays where it is; the next
-// creation deletes it first.
+// caption 1 as title, the critical icon). A file is built under a temporary name and put in
+// place only when complete (jet::StagedDatabase): a failure or a kill leaves the file that
+// was there as it was, never a half-built one.
 namespace etq::db {
 
 // The working database: the document tables, links to the permanent tables of the document
@@ -23,7 +25,12 @@ void AttachTable(jet::Database& db, const QString& sourcePath, const QString& ta
 // that is there: its items, alternate keys and special prices are lost.
 QString CreateItemDatabase(const QString& path);
 
-// Adds tAccountDef and tPriceList to an item database (the upgrade of an older file).
+// The item database as a first run and a clean import need it: CreateItemDatabase and
+// AddAccountTables in one file that appears complete.
+QString CreateItemDatabaseWithAccounts(const QString& path);
+
+// Adds tAccountDef and tPriceList to an item database (the upgrade of an older file), both or
+// neither.
 QString AddAccountTables(const QString& path);
 
 // The temporary items database: staging tables, links to the item database at itemDbPath, and
@@ -45,7 +52,15 @@ void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrice
                      const std::function<void(const QString&)>& showMessage);
 
 // What the upgrade button does with the database folder: adds the account tables to an
-// existing item database. True when there is nothing to upgrade or the upgrade worked.
+// existing item database. True when there is nothing to upgrade or the upgrade worked; an item
+// database that is damaged or lacks its item tables is reported and not upgraded.
 bool UpgradeItemDatabase(const QString& folder);
+
+// The tables an item database cannot do without (the account tables come with the upgrade).
+QStringList itemTableNames();
+
+// Why the database file at `path` cannot be used as it stands: it does not open as a database
+// of ours, or it lacks one of `tables`. Empty when it can.
+QString whyUnusable(const QString& path, const QStringList& tables);
 
 }  // namespace etq::db

@@ -55,8 +55,7 @@ bool runSteps(const Surface& surface) {
 
     // A missing item database, or the wish to start afresh, makes a new, empty one.
     if (!QFileInfo::exists(itemDb) || clean) {
-        if (db::CreateItemDatabase(itemDb).isEmpty()) return false;
-        if (db::AddAccountTables(itemDb).isEmpty()) return false;
+        if (db::CreateItemDatabaseWithAccounts(itemDb).isEmpty()) return false;
     }
 
     const QString docDb = db::inFolder(folder, db::kDocDatabaseFile);

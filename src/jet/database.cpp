@@ -113,6 +113,10 @@ void checkDefinition(const TableDef& def) {
 Database Database::create(const QString& path, const QString& locale) {
     if (QFileInfo::exists(path))
         fail(err::kDatabaseExists, QString("Database '%1' already exists.").arg(path));
+    return initialize(path, locale);
+}
+
+Database Database::initialize(const QString& path, const QString& locale) {
     Database db(openConnection(path, SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE));
     Connection& c = *db.conn_;
     c.exec("BEGIN");
