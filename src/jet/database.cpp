@@ -267,7 +267,8 @@ void Database::linkTable(const QString& name, const QString& sourcePath,
     Stmt add = conn_->prepare(
         "INSERT INTO main.MSysLinks (Name, Connect, SourceTable) VALUES (?1, ?2, ?3)", false);
     add.bind(1, name);
-    add.bind(2, ";DATABASE=" + sourcePath);
+    // Absolute: a relative path would mean another file from another working folder.
+    add.bind(2, ";DATABASE=" + QFileInfo(sourcePath).absoluteFilePath());
     add.bind(3, find.column(0).toString());
     add.step();
     conn_->forgetDefinitions();

@@ -44,7 +44,8 @@ class Database {
     QStringList tableNames() const;  // local tables, then links, each in creation order
 
     // Links the table of the same name in another database file. The file and its table must
-    // exist (3024, 3078); the link is kept in this file and resolved on every open.
+    // exist (3024, 3078); the link is kept in this file, with the file's absolute path, and
+    // resolved on every open.
     void linkTable(const QString& name, const QString& sourcePath, const QString& sourceTable = {});
     QList<LinkDef> links() const;
 

@@ -17,8 +17,9 @@ struct CliRun {
     QString out, err;
 };
 
-CliRun cli(const QStringList& args) {
+CliRun cli(const QStringList& args, const QString& workingFolder = {}) {
     QProcess p;
+    if (!workingFolder.isEmpty()) p.setWorkingDirectory(workingFolder);
     p.start(ETIQUON_CLI, args);
     p.waitForFinished(60000);
     return {p.exitCode(), QString::fromUtf8(p.readAllStandardOutput()),
@@ -84,6 +85,21 @@ TEST(InitDb, ReplacesUnusableFilesKeepingACopyAndRefusesAnUnusableFolder) {
     EXPECT_NE(unusable.code, 0);
     EXPECT_FALSE(unusable.err.isEmpty());
     EXPECT_EQ(cli({"init-db"}).code, 2);
+}
+
+// A folder given relatively, with a ';' in its name: the working database's links name the
+// files absolutely and reach them from any working folder.
+TEST(InitDb, ARelativeFolderGetsAbsoluteLinks) {
+    QTemporaryDir dir;
+    ASSERT_EQ(cli({"init-db", "--db", "shop;2/db"}, dir.path()).code, 0);
+    const QString folder = dir.path() + "/shop;2/db";
+    jet::Database work = jet::Database::open(inFolder(folder, kWorkDatabaseFile));
+    ASSERT_FALSE(work.links().isEmpty());
+    for (const jet::LinkDef& link : work.links()) {
+        EXPECT_TRUE(link.sourcePath().startsWith(folder + "/")) << link.connect.toStdString();
+        EXPECT_FALSE(work.tableDef(link.name).fields.isEmpty()) << link.name.toStdString();
+    }
+    EXPECT_GT(work.openRecordset("tDocTypes").recordCount(), 0);
 }
 
 TEST(Upgrade, AnItemDatabaseWithoutItsItemTablesIsNotUpgraded) {

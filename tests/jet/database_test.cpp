@@ -223,6 +223,31 @@ TEST_F(DatabaseTest, TransactionsCommitAndRollBack) {
     EXPECT_EQ(rows(db, "SELECT ItemKey FROM tItems"), QStringList{"1"});
 }
 
+// A link made with a relative path, from a folder whose name holds a ';' (which also ends the
+// parts of a connect text), still reaches its table from another working folder.
+TEST_F(DatabaseTest, LinksAreStoredWithAbsolutePathsThatMayHoldSemicolons) {
+    const QString folder = file("a;b #1");
+    ASSERT_TRUE(QDir().mkpath(folder));
+    {
+        Database items = Database::create(folder + "/items.kdb");
+        items.createTable(itemsDef());
+        items.execute("INSERT INTO tItems (ItemKey, ItemName) VALUES ('A1', 'Soap')");
+    }
+    const QString before = QDir::currentPath();
+    ASSERT_TRUE(QDir::setCurrent(dir_.path()));
+    {
+        Database work = Database::create("a;b #1/work.tmp");
+        work.linkTable("tItems", "a;b #1/items.kdb");
+    }
+    ASSERT_TRUE(QDir::setCurrent(QDir::rootPath()));
+    Database work = Database::open(folder + "/work.tmp");
+    QDir::setCurrent(before);
+    ASSERT_EQ(work.links().size(), 1);
+    EXPECT_EQ(work.links()[0].connect, ";DATABASE=" + folder + "/items.kdb");
+    EXPECT_EQ(work.links()[0].sourcePath(), folder + "/items.kdb");
+    EXPECT_EQ(rows(work, "SELECT ItemName FROM tItems"), QStringList{"Soap"});
+}
+
 class StagedDatabaseTest : public JetTest {
   protected:
     // The files of the folder, hidden ones too: what a build leaves beside its file.
