@@ -14,6 +14,8 @@ packages=(
     sqlite3 zint zbar-tools python3 python3-dbfread
     # dBASE files as other tools write them, for the reader's tests
     python3-dbf shapelib
+    # fuzzing (tools/fuzz.sh): clang with libFuzzer's runtime, and a symbolizer for its reports
+    clang libclang-rt-14-dev llvm-14
     # desktop stand-ins: printers, Hebrew fonts, a display for screenshots, a browser
     cups-client culmus fonts-dejavu-core xvfb xauth chromium
 )
