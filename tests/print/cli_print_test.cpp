@@ -163,11 +163,11 @@ TEST_F(CliPrintRunTest, TwoRunsAtOnceEachShowOnlyTheirOwnLabels) {
     constexpr int kItems = 30;
     struct Run {
         QString prefix;
-        int firstBarcode;
-        QString folder;
-        QProcess process;
+        int firstBarcode = 0;
+        QString folder{};
+        QProcess process{};
     };
-    Run runs[2] = {{"Left", 1000, {}, {}}, {"Right", 5000, {}, {}}};
+    Run runs[2] = {{"Left", 1000}, {"Right", 5000}};
     for (Run& run : runs)
         run.folder = folderWithItems(run.prefix, run.firstBarcode, kItems);
     for (int round = 0; round < 2; ++round) {
