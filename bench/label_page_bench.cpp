@@ -16,7 +16,6 @@
 #include "db/local_databases.h"
 #include "jet/database.h"
 #include "jet/recordset.h"
-#include "platform/print_folder.h"
 #include "platform/progress.h"
 #include "platform/settings_store.h"
 #include "print/barcode_images.h"
@@ -130,8 +129,8 @@ int main(int argc, char** argv) {
     def.bar.BarType = 6;  // EAN-13
     NoProgress progress;
 
-    // Rounds as a user runs them: each print run first deletes the bitmaps of the one before.
-    // zint writes into an emptied folder each round.
+    // Rounds as a user runs them: each print run writes into a new folder of its own. zint
+    // writes into an emptied folder each round.
     constexpr int kRounds = 5;
     QList<double> runs;
     QList<double> zints;
@@ -146,11 +145,12 @@ int main(int argc, char** argv) {
         zints.append(zintSeconds(scratch.path(), labels));
         if (zints.last() < 0) return 1;
     }
-    const int bitmaps = int(QDir(printFolder()).entryList({"B*.BMP"}, QDir::Files).size());
+    const QString runFolder = QFileInfo(page).path();
+    const int bitmaps = int(QDir(runFolder).entryList({"B*.BMP"}, QDir::Files).size());
 
     // The parts alone: the bitmaps with one library instance, and the page.
     timer.restart();
-    MakeBarcodeImages(printFolder(), "BarCode", 4, workDb, BuildLabelQuery(input.query), def.bar);
+    MakeBarcodeImages(runFolder, "BarCode", 4, workDb, BuildLabelQuery(input.query), def.bar);
     const double images = timer.nsecsElapsed() / 1e9;
     timer.restart();
     writeLabelPage(page, workDb, input, def, progress);

@@ -10,6 +10,10 @@ packages=(
     qt6-base-dev libgl-dev libsqlite3-dev libzint-dev
     # tests and benchmarks: GoogleTest, and the independent tools the tests check against
     libgtest-dev sqlite3 zint zbar-tools python3 python3-dbfread
+    # dBASE files as other tools write them, for the reader's tests
+    python3-dbf shapelib
+    # fuzzing (tools/fuzz.sh): clang with libFuzzer's runtime, and a symbolizer for its reports
+    clang libclang-rt-14-dev llvm-14
     # desktop stand-ins: printers, Hebrew fonts, a display for screenshots, a browser
     cups-client culmus fonts-dejavu-core xvfb xauth chromium
 )

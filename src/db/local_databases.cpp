@@ -1,6 +1,5 @@
 #include "db/local_databases.h"
 
-#include <QFile>
 #include <QFileInfo>
 
 #include "db/file_names.h"
@@ -15,18 +14,20 @@ using jet::Database;
 
 namespace {
 
-// Creation replaces a file that is there.
-void removeExisting(const QString& path) {
-    if (!QFileInfo::exists(path)) return;
-    QFile file(path);
-    if (!file.remove())
-        jet::fail(jet::err::kCannotOpen,
-                  QString("Cannot replace '%1': %2.").arg(path, file.errorString()));
-}
-
 void createQueries(Database& db, const schema::SavedQuery* queries, size_t count) {
     for (size_t i = 0; i < count; ++i)
         db.createQuery(queries[i].name, queries[i].sql);
+}
+
+void addItemTables(Database& db) {
+    for (const jet::TableDef* t : {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
+        db.createTable(*t);
+    createQueries(db, schema::kItemQueries, std::size(schema::kItemQueries));
+}
+
+void addAccountTables(Database& db) {
+    db.createTable(schema::accountDef());
+    db.createTable(schema::priceList());
 }
 
 }  // namespace
@@ -37,8 +38,8 @@ void AttachTable(Database& db, const QString& sourcePath, const QString& tableNa
 
 QString CreateDocDatabase(const QString& docRefPath, const QString& itemDbPath,
                           const QString& workPath, const QString& logDbPath) {
-    removeExisting(workPath);
-    Database db = Database::create(workPath);
+    jet::StagedDatabase staged(workPath);  // replaces a file that is there, once complete
+    Database& db = staged.database();
     db.createTable(schema::tempDocHeaders());
     db.createTable(schema::tempDocLines());
     db.createTable(schema::transports());
@@ -48,15 +49,22 @@ QString CreateDocDatabase(const QString& docRefPath, const QString& itemDbPath,
     }
     if (!logDbPath.isEmpty()) AttachTable(db, logDbPath, schema::stockLog().name);
     createQueries(db, schema::kWorkQueries, std::size(schema::kWorkQueries));
+    staged.commit();
     return workPath;
 }
 
 QString CreateItemDatabase(const QString& path) {
-    removeExisting(path);
-    Database db = Database::create(path);
-    for (const jet::TableDef* t : {&schema::items(), &schema::alterKeys(), &schema::alterPrices()})
-        db.createTable(*t);
-    createQueries(db, schema::kItemQueries, std::size(schema::kItemQueries));
+    jet::StagedDatabase staged(path);  // replaces a file that is there, once complete
+    addItemTables(staged.database());
+    staged.commit();
+    return path;
+}
+
+QString CreateItemDatabaseWithAccounts(const QString& path) {
+    jet::StagedDatabase staged(path);
+    addItemTables(staged.database());
+    addAccountTables(staged.database());
+    staged.commit();
     return path;
 }
 
@@ -64,20 +72,22 @@ QString AddAccountTables(const QString& path) {
     // A missing file is told in English whatever the language, as the upgrade always did.
     if (!QFileInfo::exists(path)) throw Failure("Database not found", "Error");
     Database db = Database::open(path);
-    db.createTable(schema::accountDef());
-    db.createTable(schema::priceList());
+    db.beginTrans();  // both tables or neither, whenever the upgrade stops
+    addAccountTables(db);
+    db.commitTrans();
     return path;
 }
 
 QString CreateTempItemDatabase(const QString& tempPath, const QString& itemDbPath) {
-    removeExisting(tempPath);
-    Database db = Database::create(tempPath);
+    jet::StagedDatabase staged(tempPath);  // replaces a file that is there, once complete
+    Database& db = staged.database();
     for (const jet::TableDef* t : {&schema::tempItems(), &schema::tempAlterKeys(),
                                    &schema::tempAlterPrices(), &schema::tempPriceList()})
         db.createTable(*t);
     for (const char* table : schema::kTempItemLinks)
         AttachTable(db, itemDbPath, table);
     createQueries(db, schema::kTempItemQueries, std::size(schema::kTempItemQueries));
+    staged.commit();
     return tempPath;
 }
 
@@ -91,9 +101,9 @@ void MergeTempItems(const QString& tempPath) {
 }
 
 QString CreateLogDatabase(const QString& path) {
-    removeExisting(path);
-    Database db = Database::create(path);
-    db.createTable(schema::stockLog());
+    jet::StagedDatabase staged(path);  // replaces a file that is there, once complete
+    staged.database().createTable(schema::stockLog());
+    staged.commit();
     return path;
 }
 
@@ -108,7 +118,27 @@ void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrice
 
 void UpgradeItemDatabase(const QString& folder) {
     const QString path = inFolder(folder, kItemDatabaseFile);
-    if (QFileInfo::exists(path)) AddAccountTables(path);
+    if (!QFileInfo::exists(path)) return;
+    // Account tables added to a file without its items would make a broken file look upgraded.
+    if (const QString why = whyUnusable(path, itemTableNames()); !why.isEmpty()) throw Failure(why);
+    AddAccountTables(path);
+}
+
+QStringList itemTableNames() {
+    return {schema::items().name, schema::alterKeys().name, schema::alterPrices().name};
+}
+
+QString whyUnusable(const QString& path, const QStringList& tables) {
+    try {
+        Database db = Database::open(path);
+        QStringList missing;
+        for (const QString& table : tables)
+            if (!db.hasTable(table)) missing << table;
+        if (missing.isEmpty()) return {};
+        return QString("%1 lacks the tables %2").arg(path, missing.join(", "));
+    } catch (const jet::JetError& e) {
+        return QString("%1 is damaged or not a database of Etiquon: %2").arg(path, e.description());
+    }
 }
 
 }  // namespace etq::db

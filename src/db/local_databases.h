@@ -1,13 +1,16 @@
 #pragma once
 
 #include <QString>
+#include <QStringList>
 #include <functional>
 
 #include "jet/database.h"
 
 // The creation routines of the component's databases. Each creating routine returns the path
 // it made; a failure throws (the engine's JetError, or a Failure) and the caller reports it. A
-// half-built file stays where it is; the next creation deletes it first.
+// file is built under a temporary name and put in place only when complete
+// (jet::StagedDatabase): a failure or a kill leaves the file that was there as it was, never a
+// half-built one.
 namespace etq {
 class Context;
 class Progress;
@@ -27,8 +30,13 @@ void AttachTable(jet::Database& db, const QString& sourcePath, const QString& ta
 // that is there: its items, alternate keys and special prices are lost.
 QString CreateItemDatabase(const QString& path);
 
-// Adds tAccountDef and tPriceList to an item database (the upgrade of an older file). A missing
-// file is the Failure "Database not found", titled "Error" whatever the language.
+// The item database as a first run and a clean import need it: CreateItemDatabase and
+// AddAccountTables in one file that appears complete.
+QString CreateItemDatabaseWithAccounts(const QString& path);
+
+// Adds tAccountDef and tPriceList to an item database (the upgrade of an older file), both or
+// neither. A missing file is the Failure "Database not found", titled "Error" whatever the
+// language.
 QString AddAccountTables(const QString& path);
 
 // The temporary items database: staging tables, links to the item database at itemDbPath, and
@@ -49,7 +57,15 @@ void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrice
                      const Context& context, Progress& progress);
 
 // What the upgrade does with the database folder: adds the account tables to an existing item
-// database. A folder without one has nothing to upgrade, which is no failure.
+// database. A folder without one has nothing to upgrade, which is no failure; an item database
+// that is damaged or lacks its item tables is not upgraded (a Failure says why).
 void UpgradeItemDatabase(const QString& folder);
+
+// The tables an item database cannot do without (the account tables come with the upgrade).
+QStringList itemTableNames();
+
+// Why the database file at `path` cannot be used as it stands: it does not open as a database
+// of ours, or it lacks one of `tables`. Empty when it can.
+QString whyUnusable(const QString& path, const QStringList& tables);
 
 }  // namespace etq::db

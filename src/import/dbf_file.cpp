@@ -1,9 +1,16 @@
 #include "import/dbf_file.h"
 
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
 #include <QFile>
 #include <QtEndian>
+#include <cerrno>
+#include <cstring>
 
 #include "platform/codepage1255.h"
+#include "platform/unique_fd.h"
 
 namespace etq {
 
@@ -12,6 +19,9 @@ namespace {
 constexpr int kFileHeaderSize = 32;
 constexpr int kDescriptorSize = 32;
 constexpr char kHeaderTerminator = 0x0D;
+// Visual FoxPro tables keep the path of their database container (or NULs) after the
+// terminator; they say so in the version byte.
+constexpr int kFoxProBacklinkSize = 263;
 
 quint16 u16At(const char* p) {
     return qFromLittleEndian<quint16>(p);
@@ -20,29 +30,60 @@ quint32 u32At(const char* p) {
     return qFromLittleEndian<quint32>(p);
 }
 
+bool isFoxPro(char version) {
+    return version == 0x30 || version == 0x31 || version == 0x32;
+}
+
 // Padding in a text field: blanks, and the NUL bytes some writers leave in unused fields.
 bool isPadding(char c) {
     return c == ' ' || c == '\0';
 }
 
+bool isDeletionFlag(char c) {
+    return c == ' ' || c == '*';
+}
+
+QString systemError(int error) {
+    return QString::fromLocal8Bit(std::strerror(error));
+}
+
+QString kindOf(mode_t mode) {
+    if (S_ISFIFO(mode)) return QStringLiteral("a pipe");
+    if (S_ISCHR(mode) || S_ISBLK(mode)) return QStringLiteral("a device");
+    if (S_ISDIR(mode)) return QStringLiteral("a folder");
+    if (S_ISSOCK(mode)) return QStringLiteral("a socket");
+    return QStringLiteral("no regular file");
+}
+
+// Reads `size` bytes at `offset`; fewer only where the file ends. -1 on a read error.
+qint64 readAt(int fd, char* into, qint64 size, qint64 offset) {
+    qint64 done = 0;
+    while (done < size) {
+        const ssize_t n = ::pread(fd, into + done, size_t(size - done), offset + done);
+        if (n < 0 && errno == EINTR) continue;
+        if (n < 0) return -1;
+        if (n == 0) break;
+        done += n;
+    }
+    return done;
+}
+
 }  // namespace
 
-DbfError::DbfError(QString message) : message_(std::move(message)), utf8_(message_.toUtf8()) {}
-
 DbfFile::DbfFile(const QString& path) : path_(path) {
-    QFile file(path_);
-    if (!file.open(QIODevice::ReadOnly))
-        throw DbfError(QStringLiteral("Cannot open %1: %2").arg(path_, file.errorString()));
-    contents_ = file.readAll();
-    if (file.error() != QFileDevice::NoError)
-        throw DbfError(QStringLiteral("Cannot read %1: %2").arg(path_, file.errorString()));
-    // What was read is what counts: a file the host shortens meanwhile fails the checks below.
-    const qint64 size = contents_.size();
-    if (size < kFileHeaderSize)
-        fail(QStringLiteral("it is %1 bytes long, shorter than a dBASE header (32 bytes)")
-                 .arg(size));
-    readHeader(size);
+    // Without O_NONBLOCK a pipe in the file's place would hold the open until a writer came.
+    const UniqueFd fd(
+        ::open(QFile::encodeName(path_).constData(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));
+    if (!fd.isOpen())
+        throw DbfError(QStringLiteral("Cannot open %1: %2").arg(path_, systemError(errno)));
+    struct stat info;
+    if (::fstat(fd.get(), &info) != 0)
+        throw DbfError(QStringLiteral("Cannot read %1: %2").arg(path_, systemError(errno)));
+    if (!S_ISREG(info.st_mode))
+        fail(QStringLiteral("it is %1, not a file").arg(kindOf(info.st_mode)));
+    readContents(fd.get(), info.st_size);
     readFieldDescriptors();
+    checkDeletionFlags();
 }
 
 DbfFile::DbfFile(const QString& path, qint64 firstRecord) : path_(path) {
@@ -83,6 +124,27 @@ void DbfFile::fail(const QString& what) const {
     throw DbfError(QStringLiteral("%1 is not a readable dBASE file: %2").arg(path_, what));
 }
 
+// Reads the header, then the records it announces and not a byte more: whatever follows them
+// (the end mark, or anything else) is never read.
+void DbfFile::readContents(int fd, qint64 fileSize) {
+    contents_.resize(kFileHeaderSize);
+    const qint64 header = readAt(fd, contents_.data(), kFileHeaderSize, 0);
+    if (header < 0)
+        throw DbfError(QStringLiteral("Cannot read %1: %2").arg(path_, systemError(errno)));
+    if (header < kFileHeaderSize)
+        fail(QStringLiteral("it is %1 bytes long, shorter than a dBASE header (32 bytes)")
+                 .arg(header));
+    readHeader(fileSize);
+    const qint64 needed = headerLength_ + recordCount_ * recordLength_;
+    contents_.resize(needed);
+    const qint64 rest =
+        readAt(fd, contents_.data() + kFileHeaderSize, needed - kFileHeaderSize, kFileHeaderSize);
+    if (rest < 0)
+        throw DbfError(QStringLiteral("Cannot read %1: %2").arg(path_, systemError(errno)));
+    // What was read is what counts: a file the host shortens meanwhile fails like a short one.
+    readHeader(kFileHeaderSize + rest);
+}
+
 void DbfFile::readHeader(qint64 fileSize) {
     recordCount_ = u32At(contents_.constData() + 4);
     headerLength_ = u16At(contents_.constData() + 8);
@@ -107,19 +169,74 @@ void DbfFile::readHeader(qint64 fileSize) {
 }
 
 void DbfFile::readFieldDescriptors() {
-    int offset = 1;
-    for (int pos = kFileHeaderSize;
-         pos + kDescriptorSize <= headerLength_ && contents_[pos] != kHeaderTerminator;
-         pos += kDescriptorSize) {
+    int pos = kFileHeaderSize;
+    for (; pos < headerLength_ && contents_[pos] != kHeaderTerminator; pos += kDescriptorSize) {
+        if (pos + kDescriptorSize > headerLength_) break;
         const char* d = contents_.constData() + pos;
         DbfField field;
         field.name = decode1255(QByteArrayView(d, qstrnlen(d, 11)));
         field.type = d[11];
         field.length = static_cast<unsigned char>(d[16]);
         field.decimals = static_cast<unsigned char>(d[17]);
-        field.offset = offset;
-        offset += field.length;
         fields_.append(field);
+    }
+    if (pos >= headerLength_ || contents_[pos] != kHeaderTerminator)
+        fail(QStringLiteral("its field descriptors run to the header length %1 without their "
+                            "terminator (0x0D)")
+                 .arg(headerLength_));
+    checkHeaderLength(pos);
+    placeFields();
+}
+
+void DbfFile::checkHeaderLength(int terminator) const {
+    const int end = terminator + 1;
+    if (headerLength_ == end) return;
+    // Some writers leave one NUL byte after the terminator.
+    if (headerLength_ == end + 1 && contents_[end] == '\0') return;
+    if (isFoxPro(contents_[0]) && headerLength_ == end + kFoxProBacklinkSize) return;
+    fail(QStringLiteral("the header length %1 does not fit its %2 field descriptors, whose "
+                        "terminator (0x0D) is byte %3")
+             .arg(headerLength_)
+             .arg(fields_.size())
+             .arg(terminator));
+}
+
+// The fields' lengths must add up to the record length. Clipper and FoxPro write a text field
+// longer than 255 bytes with the high byte of its length in the decimals; such a file adds up
+// only when read that way.
+void DbfFile::placeFields() {
+    int plain = 1;
+    int wide = 1;
+    for (const DbfField& f : fields_) {
+        plain += f.length;
+        wide += f.type == 'C' ? f.length + 256 * f.decimals : f.length;
+    }
+    if (plain != recordLength_ && wide != recordLength_)
+        fail(QStringLiteral("the record length %1 does not fit its field descriptors, which add "
+                            "up to %2 bytes with the deletion flag")
+                 .arg(recordLength_)
+                 .arg(plain));
+    int offset = 1;
+    for (DbfField& f : fields_) {
+        if (plain != recordLength_ && f.type == 'C') {
+            f.length += 256 * f.decimals;
+            f.decimals = 0;
+        }
+        f.offset = offset;
+        offset += f.length;
+    }
+}
+
+// A record that does not begin with its flag means the records are not where the header puts
+// them. One pass over bytes already in memory: far quicker than the readers that follow.
+void DbfFile::checkDeletionFlags() const {
+    const char* flag = contents_.constData() + headerLength_;
+    for (qint64 record = 0; record < recordCount_; ++record, flag += recordLength_) {
+        if (!isDeletionFlag(*flag))
+            fail(QStringLiteral("record %1 begins with the byte 0x%2, not with a deletion flag "
+                                "(a blank or '*')")
+                     .arg(record + 1)
+                     .arg(uchar(*flag), 2, 16, QLatin1Char('0')));
     }
 }
 

@@ -4,21 +4,17 @@
 #include <QByteArrayView>
 #include <QList>
 #include <QString>
-#include <exception>
+
+#include "platform/failure.h"
 
 namespace etq {
 
 // A host file that cannot be read as a dBASE file, or a read outside its records. The message
 // names the file and says what is wrong.
-class DbfError : public std::exception {
+class DbfError : public HostFileDamaged {
   public:
-    explicit DbfError(QString message);
-    const QString& message() const { return message_; }
-    const char* what() const noexcept override { return utf8_.constData(); }
-
-  private:
-    QString message_;
-    QByteArray utf8_;
+    using HostFileDamaged::HostFileDamaged;
+    const QString& message() const { return description(); }
 };
 
 // A field at a fixed place in a record: byte offset from the record's start (byte 0 is the
@@ -38,14 +34,20 @@ struct DbfField {
 };
 
 // A host dBASE file opened for reading. The host's readers take fields at fixed offsets, so
-// the field descriptors are parsed for inspection only. The whole file is read into memory
-// when it is opened (one read of a few tens of megabytes at most): the host package may
+// the field descriptors are parsed for inspection only. The file's records are read into
+// memory when it is opened (one read of a few tens of megabytes at most): the host package may
 // rewrite its files while we read them, and a mapped file cut short under us would kill the
 // process on the next access instead of failing cleanly.
 //
-// Everything is checked when the file is opened (the header against the file's size) and on
-// every access (the field against the record length, the record against the record count);
-// a failure throws DbfError and nothing is ever read past a record or the file.
+// Only a regular file is read (a pipe or a device in its place is refused without waiting on
+// it), and never more of it than its header announces. The header must describe the records
+// exactly: the descriptors end in their terminator (0x0D) where the header length says, give
+// or take the one blank byte some writers add and Visual FoxPro's 263-byte link to its
+// database container; the field lengths add up to the record length; and every record begins
+// with its deletion flag. A header length or record length that is off by a byte or two would
+// otherwise shift every field into its neighbour without a word. Every access is checked too
+// (the field against the record length, the record against the record count). A failure
+// throws DbfError and nothing is ever read past a record or the file.
 class DbfFile {
   public:
     // Opens and validates `path`; throws DbfError.
@@ -94,8 +96,12 @@ class DbfFile {
     }
 
   private:
+    void readContents(int fd, qint64 fileSize);
     void readHeader(qint64 fileSize);
     void readFieldDescriptors();
+    void checkHeaderLength(int terminator) const;
+    void placeFields();
+    void checkDeletionFlags() const;
     [[noreturn]] void fail(const QString& what) const;
     const char* at(qint64 record, int offset, int width) const {
         if (record < firstRecord_ || record >= recordCount_ || offset < 0 || width < 0 ||

@@ -7,7 +7,6 @@
 #include <QString>
 #include <exception>
 #include <optional>
-#include <stdexcept>
 
 #include "import/dbf_file.h"
 #include "import/host_layouts.h"

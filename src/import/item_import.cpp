@@ -16,10 +16,7 @@ void importItems(const ItemImportOptions& options, const Context& context, Progr
     const auto showStep = [&](int caption) { progress.step(context.caption(caption)); };
 
     // A missing item database, or the wish to start afresh, makes a new, empty one.
-    if (!QFileInfo::exists(itemDb) || options.clean) {
-        db::CreateItemDatabase(itemDb);
-        db::AddAccountTables(itemDb);
-    }
+    if (!QFileInfo::exists(itemDb) || options.clean) db::CreateItemDatabaseWithAccounts(itemDb);
 
     const QString docDb = db::inFolder(folder, db::kDocDatabaseFile);
     const QString workDb = db::inFolder(folder, db::kWorkDatabaseFile);

@@ -114,6 +114,10 @@ void checkDefinition(const TableDef& def) {
 Database Database::create(const QString& path, const QString& locale) {
     if (QFileInfo::exists(path))
         fail(err::kDatabaseExists, QString("Database '%1' already exists.").arg(path));
+    return initialize(path, locale);
+}
+
+Database Database::initialize(const QString& path, const QString& locale) {
     Database db(openConnection(path, SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE));
     Connection& c = *db.conn_;
     c.exec("BEGIN");
@@ -263,7 +267,8 @@ void Database::linkTable(const QString& name, const QString& sourcePath,
     Stmt add = conn_->prepare(
         "INSERT INTO main.MSysLinks (Name, Connect, SourceTable) VALUES (?1, ?2, ?3)", false);
     add.bind(1, name);
-    add.bind(2, ";DATABASE=" + sourcePath);
+    // Absolute: a relative path would mean another file from another working folder.
+    add.bind(2, ";DATABASE=" + QFileInfo(sourcePath).absoluteFilePath());
     add.bind(3, find.column(0).toString());
     add.step();
     conn_->forgetDefinitions();

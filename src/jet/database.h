@@ -44,7 +44,8 @@ class Database {
     QStringList tableNames() const;  // local tables, then links, each in creation order
 
     // Links the table of the same name in another database file. The file and its table must
-    // exist (3024, 3078); the link is kept in this file and resolved on every open.
+    // exist (3024, 3078); the link is kept in this file, with the file's absolute path, and
+    // resolved on every open.
     void linkTable(const QString& name, const QString& sourcePath, const QString& sourceTable = {});
     QList<LinkDef> links() const;
 
@@ -76,11 +77,52 @@ class Database {
     detail::Connection& connection() const;  // for the engine's own parts
 
   private:
+    friend class StagedDatabase;
     explicit Database(std::shared_ptr<detail::Connection> conn) : conn_(std::move(conn)) {}
+    // The catalog of a new file at `path`, which is missing or empty.
+    static Database initialize(const QString& path, const QString& locale);
     bool nameTaken(const QString& name) const;
     void attachLinks();
 
     std::shared_ptr<detail::Connection> conn_;
+};
+
+// A database file that appears at its path only when it is complete. It is built under a
+// temporary name in the same folder; commit() closes it, forces it to disk, renames it over
+// whatever file the path held and forces the folder to disk, so that whoever opens the path,
+// and whatever a kill leaves behind, finds the old file or the new one, whole. Destroyed
+// without commit() (a failure while building), it deletes the temporary file and the old file
+// stays as it was.
+class StagedDatabase {
+  public:
+    // A new, empty database to be put at `path`.
+    explicit StagedDatabase(const QString& path, const QString& locale = kHebrewLocale);
+    // A copy of the database file `source` to be put at `path`; the copy must open as a
+    // database of ours (3024, 3343).
+    static StagedDatabase copyOf(const QString& source, const QString& path);
+    ~StagedDatabase();
+    StagedDatabase(StagedDatabase&& other) noexcept;
+    StagedDatabase& operator=(StagedDatabase&&) = delete;
+    StagedDatabase(const StagedDatabase&) = delete;
+    StagedDatabase& operator=(const StagedDatabase&) = delete;
+
+    // The file being built. Copies of it and recordsets on it must be gone, and no transaction
+    // open, by commit().
+    Database& database() { return db_; }
+    // The temporary file, for messages and tests.
+    const QString& stagedPath() const { return staged_; }
+    // Puts the file at its path. Throws JetError when it cannot; the old file then stays.
+    void commit();
+
+  private:
+    struct FileOnly {};
+    StagedDatabase(FileOnly, const QString& path);  // the temporary file, still empty
+    void discard() noexcept;
+
+    QString path_;
+    QString staged_;
+    Database db_;
+    bool done_ = false;
 };
 
 }  // namespace etq::jet

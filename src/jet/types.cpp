@@ -26,12 +26,12 @@ const FieldDef* TableDef::field(const QString& fieldName) const {
 }
 
 QString LinkDef::sourcePath() const {
+    // The engine writes DATABASE last, so its path runs to the end of the text: a ';' in a
+    // folder's name is part of the path, not the start of another part.
     const QString key = ";DATABASE=";
     const qsizetype at = connect.indexOf(key, 0, Qt::CaseInsensitive);
     if (at < 0) return {};
-    QString path = connect.mid(at + key.size());
-    const qsizetype end = path.indexOf(u';');
-    return end < 0 ? path : path.left(end);
+    return connect.mid(at + key.size());
 }
 
 QString declaredType(const FieldDef& field) {

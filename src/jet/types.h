@@ -38,10 +38,10 @@ struct TableDef {
 
 // A table that lives in another database file and is reached through this one.
 struct LinkDef {
-    QString name;         // the name under which this database reaches it
-    QString connect;      // ";DATABASE=" followed by the source file's path
-    QString sourceTable;  // the table's name in the source file
-    QString sourcePath() const;
+    QString name;                // the name under which this database reaches it
+    QString connect;             // ";DATABASE=" followed by the source file's absolute path
+    QString sourceTable;         // the table's name in the source file
+    QString sourcePath() const;  // the rest of the text after ";DATABASE="
 };
 
 // The declared SQL type of a field, as stored in the file ("TEXT(20)", "LONG", ...).

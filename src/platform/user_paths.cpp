@@ -1,9 +1,10 @@
 #include "platform/user_paths.h"
 
-#include <unistd.h>
 #include <QDir>
-#include <QFileInfo>
 #include <QStandardPaths>
+
+#include "platform/failure.h"
+#include "platform/private_folder.h"
 
 namespace etq {
 
@@ -22,28 +23,12 @@ QString joinPath(const QString& folder, const QString& fileName) {
 }
 
 QString privateTempFolder(QString* error) {
-    // The session's runtime folder when there is one; without it Qt would make one under the
-    // shared /tmp (and warn), so the user's cache folder serves instead.
-    QString base;
-    if (!qEnvironmentVariableIsEmpty("XDG_RUNTIME_DIR"))
-        base = QStandardPaths::writableLocation(QStandardPaths::RuntimeLocation);
-    if (base.isEmpty())
-        base = QStandardPaths::writableLocation(QStandardPaths::GenericCacheLocation);
-    const QString folder = joinPath(base, QStringLiteral("etiquon"));
-    const auto privateMode = QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner;
-    if (!QDir().mkpath(folder) || !QFile::setPermissions(folder, privateMode)) {
-        if (error) *error = QStringLiteral("cannot create the private folder %1").arg(folder);
+    try {
+        return openPrivateTempFolder().path;
+    } catch (const Failure& failure) {
+        if (error) *error = failure.description();
         return {};
     }
-    // A folder someone else made in our place is not ours to fill.
-    const QFileInfo info(folder);
-    const auto othersMode = QFile::ReadGroup | QFile::WriteGroup | QFile::ExeGroup |
-                            QFile::ReadOther | QFile::WriteOther | QFile::ExeOther;
-    if (!info.isDir() || info.ownerId() != ::getuid() || (info.permissions() & othersMode)) {
-        if (error) *error = QStringLiteral("the folder %1 is not private").arg(folder);
-        return {};
-    }
-    return folder;
 }
 
 }  // namespace etq

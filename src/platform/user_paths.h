@@ -18,7 +18,8 @@ QString joinPath(const QString& folder, const QString& fileName);
 
 // The user's private folder for files that live only during a run (pages, bitmaps): "etiquon"
 // under the runtime folder, else under the cache folder, created with mode 0700. Empty, with
-// the reason in `error`, when it cannot be made private.
+// the reason in `error`, when it is a link, another user's or open to others
+// (private_folder.h: work in it through openPrivateTempFolder).
 QString privateTempFolder(QString* error = nullptr);
 
 }  // namespace etq

@@ -286,8 +286,8 @@ BuiltInPrint printBuiltInLabels(const QString& dbName, LabelPageInput& input, La
                                 Progress& progress) {
     // Built before the page ticks the cells' fields, as the page's own query is later.
     const QString sql = BuildLabelQuery(input.query);
-    const QString folder = printFolder();
-    deleteFilesIn(folder);
+    const PrintRunFolder run;
+    const QString folder = run.path();
 
     // Every barcode cell's values are read first, so that a failing query ends the run before
     // the page is begun.

@@ -1,5 +1,12 @@
 // The creation routines on real files: schemas, links, queries, the merge and the clean-up.
+#include <signal.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <QDir>
+#include <QElapsedTimer>
 #include <QProcess>
+#include <thread>
 
 #include "db/schemas.h"
 #include "db_fixture.h"
@@ -45,8 +52,9 @@ TEST_F(LocalDatabasesTest, AFailedCreationThrowsTheEngineDescription) {
     const auto failed = failureOf([&] { createWork(false); });
     ASSERT_TRUE(failed);
     EXPECT_TRUE(failed->description.contains(kItemDatabaseFile));
-    // The half-built file stays; the next creation replaces it.
-    EXPECT_TRUE(QFile::exists(path(kWorkDatabaseFile)));
+    // Nothing half-built is left at the path, nor a temporary file beside it.
+    EXPECT_FALSE(QFile::exists(path(kWorkDatabaseFile)));
+    EXPECT_EQ(QDir(dir.path()).entryList({".*"}, QDir::Files | QDir::Hidden), QStringList());
     CreateItemDatabase(path(kItemDatabaseFile));
     AddAccountTables(path(kItemDatabaseFile));
     EXPECT_EQ(createWork(false), path(kWorkDatabaseFile));
@@ -181,6 +189,81 @@ TEST_F(LocalDatabasesTest, TheDeliveredDocumentDatabaseHoldsTypesFilesRangesAndT
     ranges.update();
     EXPECT_EQ(rows(doc, "SELECT FromIndx FROM tWizFileRanges WHERE WizFileID = 12"),
               QStringList({"17"}));
+}
+
+// The tables of the item database a test file holds, and its keys: how whole it is.
+struct ItemFile {
+    QStringList tables;
+    QStringList keys;
+};
+
+ItemFile readItemFile(const QString& path) {
+    ItemFile seen;
+    jet::Database db = jet::Database::open(path);
+    for (const QString& table : {"tItems", "tAlterKeys", "tAlterPrices"})
+        if (db.hasTable(table)) seen.tables << table;
+    if (db.hasTable("tItems")) seen.keys = etq::test::jetRows(db, "SELECT ItemKey FROM tItems");
+    return seen;
+}
+
+// Runs the creation of the item database in a child process and kills it (SIGKILL) after
+// `delay`; returns once the child is gone, whether it finished or not.
+void createItemsKilledAfter(const QString& path, std::chrono::microseconds delay) {
+    const pid_t child = ::fork();
+    if (child == 0) {
+        CreateItemDatabase(path);
+        ::_exit(0);
+    }
+    std::this_thread::sleep_for(delay);
+    ::kill(child, SIGKILL);
+    ::waitpid(child, nullptr, 0);
+}
+
+// A kill at any moment of a creation that replaces a file leaves the old file or the new one,
+// whole: never a file without its tables, never no file. The kills are spread over the time a
+// creation takes here, so that they land before, in and after its steps.
+TEST_F(LocalDatabasesTest, AKillAtAnyMomentOfACreationLeavesTheOldFileOrTheNewOneWhole) {
+    const QString items = path(kItemDatabaseFile);
+    const QStringList allTables{"tItems", "tAlterKeys", "tAlterPrices"};
+    auto markOld = [&] {
+        jet::Database db = jet::Database::open(items);
+        db.execute("INSERT INTO tItems (ItemKey) VALUES ('OLD')");
+    };
+    markOld();
+    QElapsedTimer timer;
+    timer.start();
+    ASSERT_FALSE(CreateItemDatabase(path("scratch.kdb")).isEmpty());
+    const qint64 creation = timer.nsecsElapsed() / 1000;
+
+    constexpr int kKills = 24;
+    int old = 0;
+    int created = 0;
+    for (int k = 0; k < kKills; ++k) {
+        SCOPED_TRACE(k);
+        createItemsKilledAfter(items, std::chrono::microseconds(creation * k / (kKills - 2)));
+        ASSERT_TRUE(QFile::exists(items));
+        const ItemFile seen = readItemFile(items);
+        ASSERT_EQ(seen.tables, allTables);
+        if (seen.keys == QStringList{"OLD"}) {
+            ++old;
+        } else {
+            ASSERT_EQ(seen.keys, QStringList());
+            ++created;
+            markOld();
+        }
+    }
+    RecordProperty("kept_old", old);
+    RecordProperty("replaced", created);
+}
+
+TEST_F(LocalDatabasesTest, TheUpgradeRefusesAnItemDatabaseWithoutItsItemTables) {
+    QFile::remove(path(kItemDatabaseFile));
+    jet::Database::create(path(kItemDatabaseFile)).createTable(schema::items());
+    const auto failed = failureOf([&] { UpgradeItemDatabase(dir.path()); });
+    ASSERT_TRUE(failed);
+    EXPECT_TRUE(failed->description.contains("lacks the tables tAlterKeys, tAlterPrices"))
+        << failed->description.toStdString();
+    EXPECT_FALSE(jet::Database::open(path(kItemDatabaseFile)).hasTable("tAccountDef"));
 }
 
 }  // namespace

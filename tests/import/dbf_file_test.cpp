@@ -2,10 +2,18 @@
 
 #include <gtest/gtest.h>
 
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <QDir>
 #include <QFile>
+#include <QProcess>
 #include <QTemporaryDir>
 #include <QtEndian>
+#include <atomic>
 #include <functional>
+#include <thread>
 
 #include "import/host_layouts.h"
 #include "samples/host_records.h"
@@ -41,6 +49,27 @@ class DbfFileTest : public ::testing::Test {
         item.prices[9] = {123456789, "EU"};
         item.queryGroups = "5";
         return item;
+    }
+
+    static QByteArray contents(const QString& file) {
+        QFile in(file);
+        return in.open(QIODevice::ReadOnly) ? in.readAll() : QByteArray();
+    }
+    static void write(const QString& file, const QByteArray& bytes) {
+        QFile out(file);
+        ASSERT_TRUE(out.open(QIODevice::WriteOnly | QIODevice::Truncate));
+        ASSERT_EQ(out.write(bytes), bytes.size());
+    }
+
+    // Opens `file` and expects it refused with a message naming it and saying `expected`.
+    static void expectRefused(const QString& file, const QString& expected) {
+        try {
+            DbfFile opened(file);
+            ADD_FAILURE() << "opened";
+        } catch (const DbfError& e) {
+            EXPECT_TRUE(e.message().contains(file)) << e.what();
+            EXPECT_TRUE(e.message().contains(expected)) << e.what();
+        }
     }
 
     QTemporaryDir dir_;
@@ -275,6 +304,150 @@ TEST_F(DbfFileTest, AMissingFileIsReported) {
     } catch (const DbfError& e) {
         EXPECT_TRUE(e.message().startsWith("Cannot open " + path("nothing.dbf"))) << e.what();
     }
+}
+
+// A header whose lengths are off by a byte or two would shift every field into its neighbour:
+// keys into garbage, prices times 256, deleted records read. Such a file is refused.
+TEST_F(DbfFileTest, AHeaderThatDoesNotDescribeItsRecordsIsRefused) {
+    struct Damage {
+        const char* what;
+        std::function<void(QByteArray&)> apply;
+        QString expected;
+    };
+    auto setU16 = [](QByteArray& b, int at, int by) {
+        qToLittleEndian<quint16>(quint16(qFromLittleEndian<quint16>(b.constData() + at) + by),
+                                 b.data() + at);
+    };
+    auto oneRecord = [](QByteArray& b) { qToLittleEndian<quint32>(1, b.data() + 4); };
+    const QString file = writeItems({milk(), milk(), milk()});
+    const int header = DbfFile(file).headerLength();
+    const Damage damages[] = {
+        {"header one byte long", [&](QByteArray& b) { setU16(b, 8, 1); },
+         QStringLiteral("the header length %1 does not fit its").arg(header + 1)},
+        {"header two bytes long",
+         [&](QByteArray& b) {
+             setU16(b, 8, 2);
+             oneRecord(b);
+         },
+         QStringLiteral("the header length %1 does not fit its").arg(header + 2)},
+        {"header one byte short", [&](QByteArray& b) { setU16(b, 8, -1); },
+         "without their terminator (0x0D)"},
+        {"header two bytes short", [&](QByteArray& b) { setU16(b, 8, -2); },
+         "without their terminator (0x0D)"},
+        {"no terminator", [&](QByteArray& b) { b[header - 1] = ' '; },
+         "without their terminator (0x0D)"},
+        {"record one byte short", [&](QByteArray& b) { setU16(b, 10, -1); },
+         "the record length 429 does not fit its field descriptors, which add up to 430 bytes"},
+        {"record one byte long",
+         [&](QByteArray& b) {
+             setU16(b, 10, 1);
+             oneRecord(b);
+         },
+         "the record length 431 does not fit"},
+        {"a record without its flag", [&](QByteArray& b) { b[header + 2 * 430] = 'X'; },
+         "record 3 begins with the byte 0x58, not with a deletion flag"},
+    };
+    const QByteArray original = contents(file);
+    for (const Damage& damage : damages) {
+        SCOPED_TRACE(damage.what);
+        QByteArray bytes = original;
+        damage.apply(bytes);
+        const QString damaged = path(QStringLiteral("damaged %1.dbf").arg(damage.what));
+        write(damaged, bytes);
+        expectRefused(damaged, damage.expected);
+    }
+}
+
+// Files written by common dBASE tools open as they are: dBASE III and Clipper by python3-dbf,
+// Visual FoxPro with its 263-byte link after the header, dBASE III by shapelib, and the one NUL
+// byte after the terminator that some writers add.
+TEST_F(DbfFileTest, FilesOfCommonWritersOpen) {
+    const QString script = QStringLiteral(
+        "import dbf, sys\n"
+        "for kind in sys.argv[2:]:\n"
+        "    t = dbf.Table(sys.argv[1] + '/' + kind + '.dbf', 'code C(13); name C(40); qty N(8,2)',"
+        " dbf_type=kind)\n"
+        "    t.open(dbf.READ_WRITE)\n"
+        "    t.append(('A1', 'Milk', 1.5))\n"
+        "    t.append(('A2', 'Bread', 2))\n"
+        "    dbf.delete(t[1])\n"
+        "    t.close()\n");
+    QProcess python;
+    python.start(ETIQUON_PYTHON3, {"-c", script, dir_.path(), "db3", "clp", "vfp"});
+    ASSERT_TRUE(python.waitForFinished(60000));
+    ASSERT_EQ(python.exitCode(), 0) << python.readAllStandardError().data();
+    const QString shape = path("shapelib");
+    ASSERT_EQ(QProcess::execute("dbfcreate", {shape, "-s", "code", "13", "-s", "name", "40", "-n",
+                                              "qty", "8", "2"}),
+              0);
+    ASSERT_EQ(QProcess::execute("dbfadd", {shape + ".dbf", "A1", "Milk", "1.5"}), 0);
+    ASSERT_EQ(QProcess::execute("dbfadd", {shape + ".dbf", "A2", "Bread", "2"}), 0);
+
+    // The shapelib file again, with a NUL after its terminator and the header length saying so.
+    QByteArray padded = contents(shape + ".dbf");
+    const int header = qFromLittleEndian<quint16>(padded.constData() + 8);
+    padded.insert(header, '\0');
+    qToLittleEndian<quint16>(quint16(header + 1), padded.data() + 8);
+    write(path("padded.dbf"), padded);
+
+    struct Written {
+        const char* name;
+        int headerLength;
+        bool secondDeleted;
+    };
+    for (const Written& w :
+         {Written{"db3", 129, true}, Written{"clp", 129, true}, Written{"vfp", 129 + 263, true},
+          Written{"shapelib", 129, false}, Written{"padded", 130, false}}) {
+        SCOPED_TRACE(w.name);
+        const DbfFile file(path(QStringLiteral("%1.dbf").arg(w.name)));
+        EXPECT_EQ(file.headerLength(), w.headerLength);
+        ASSERT_EQ(file.recordCount(), 2);
+        ASSERT_NE(file.field(u"name"), nullptr);
+        EXPECT_EQ(file.field(u"name")->offset, 14);
+        EXPECT_EQ(file.text(1, 1, 13), "A2");
+        EXPECT_EQ(file.text(1, file.field(u"name")->offset, 40), "Bread");
+        EXPECT_EQ(file.text(0, file.field(u"qty")->offset, 8).toDouble(), 1.5);
+        EXPECT_FALSE(file.isDeleted(0));
+        EXPECT_EQ(file.isDeleted(1), w.secondDeleted);
+    }
+}
+
+// A pipe, a device or a folder in place of a host file is refused at once: a pipe must not
+// hold the import forever, /dev/zero must not be read until memory runs out.
+TEST_F(DbfFileTest, OnlyRegularFilesAreRead) {
+    const QString pipe = path("pipe.dbf");
+    ASSERT_EQ(::mkfifo(QFile::encodeName(pipe).constData(), 0600), 0);
+    const QString zero = path("zero.dbf");
+    ASSERT_TRUE(QFile::link("/dev/zero", zero));
+    const QString folder = path("folder.dbf");
+    ASSERT_TRUE(QDir().mkpath(folder));
+
+    // Should an open wait on the pipe, a writer that comes and goes at once releases it.
+    std::atomic<bool> done = false;
+    std::thread writer([&] {
+        while (!done) {
+            const int fd = ::open(QFile::encodeName(pipe).constData(), O_WRONLY | O_NONBLOCK);
+            if (fd >= 0) ::close(fd);
+            std::this_thread::sleep_for(std::chrono::milliseconds(20));
+        }
+    });
+    expectRefused(pipe, "it is a pipe, not a file");
+    done = true;
+    writer.join();
+    expectRefused(zero, "it is a device, not a file");
+    expectRefused(folder, "it is a folder, not a file");
+}
+
+// Nothing past the records the header announces is read: a file far longer than that (here
+// a sparse terabyte after three items) opens at once with its three items.
+TEST_F(DbfFileTest, NothingPastTheAnnouncedRecordsIsRead) {
+    QList<ItemRecord> items(3, milk());
+    items.last().key = "LAST";
+    const QString file = writeItems(items);
+    ASSERT_TRUE(QFile::resize(file, qint64(1) << 40));
+    const DbfFile dbf(file);
+    EXPECT_EQ(dbf.recordCount(), 3);
+    EXPECT_EQ(dbf.text(2, h::oitm::kItemKey), "LAST");
 }
 
 }  // namespace

@@ -162,6 +162,9 @@ TEST_F(ItemReaderTest, DamagedItemFilesFailCleanly) {
         [](QByteArray& b) { qToLittleEndian<quint16>(60000, b.data() + 8); },  // header
         [](QByteArray& b) { qToLittleEndian<quint16>(200, b.data() + 10); },   // short records
         [](QByteArray& b) { b.truncate(20); },
+        [](QByteArray& b) {  // header a byte long: every field would shift by one
+            qToLittleEndian<quint16>(qFromLittleEndian<quint16>(b.data() + 8) + 1, b.data() + 8);
+        },
     };
     for (const auto& how : damages) {
         damage(how);

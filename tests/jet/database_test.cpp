@@ -1,5 +1,6 @@
 // The engine's files: creation, definitions read back from disk, the errors its callers test
 // for, links between files and saved queries.
+#include <QDir>
 #include <QFile>
 #include <QProcess>
 
@@ -249,6 +250,81 @@ TEST_F(DatabaseTest, TransactionsCommitAndRollBack) {
     db.execute("INSERT INTO tItems (ItemKey) VALUES ('3')");
     db.rollback();
     EXPECT_EQ(rows(db, "SELECT ItemKey FROM tItems"), QStringList{"1"});
+}
+
+// A link made with a relative path, from a folder whose name holds a ';' (which also ends the
+// parts of a connect text), still reaches its table from another working folder.
+TEST_F(DatabaseTest, LinksAreStoredWithAbsolutePathsThatMayHoldSemicolons) {
+    const QString folder = file("a;b #1");
+    ASSERT_TRUE(QDir().mkpath(folder));
+    {
+        Database items = Database::create(folder + "/items.kdb");
+        items.createTable(itemsDef());
+        items.execute("INSERT INTO tItems (ItemKey, ItemName) VALUES ('A1', 'Soap')");
+    }
+    const QString before = QDir::currentPath();
+    ASSERT_TRUE(QDir::setCurrent(dir_.path()));
+    {
+        Database work = Database::create("a;b #1/work.tmp");
+        work.linkTable("tItems", "a;b #1/items.kdb");
+    }
+    ASSERT_TRUE(QDir::setCurrent(QDir::rootPath()));
+    Database work = Database::open(folder + "/work.tmp");
+    QDir::setCurrent(before);
+    ASSERT_EQ(work.links().size(), 1);
+    EXPECT_EQ(work.links()[0].connect, ";DATABASE=" + folder + "/items.kdb");
+    EXPECT_EQ(work.links()[0].sourcePath(), folder + "/items.kdb");
+    EXPECT_EQ(rows(work, "SELECT ItemName FROM tItems"), QStringList{"Soap"});
+}
+
+class StagedDatabaseTest : public JetTest {
+  protected:
+    // The files of the folder, hidden ones too: what a build leaves beside its file.
+    QStringList files() const {
+        return QDir(dir_.path()).entryList(QDir::Files | QDir::Hidden | QDir::NoDotAndDotDot);
+    }
+    void writeFile(const QString& name, const QByteArray& bytes) {
+        QFile out(file(name));
+        ASSERT_TRUE(out.open(QIODevice::WriteOnly));
+        out.write(bytes);
+    }
+};
+
+TEST_F(StagedDatabaseTest, TheNewFileAppearsWholeOnCommitAndNeverBefore) {
+    create("a.kdb").createTable(itemsDef());
+    Database::open(file("a.kdb")).execute("INSERT INTO tItems (ItemKey) VALUES ('OLD')");
+    {
+        StagedDatabase abandoned(file("a.kdb"));
+        abandoned.database().createTable({"tNew", {text("K", 5)}, {}});
+        Database old = Database::open(file("a.kdb"));
+        EXPECT_EQ(rows(old, "SELECT ItemKey FROM tItems"), QStringList{"OLD"});
+    }
+    EXPECT_EQ(files(), QStringList{"a.kdb"});  // destroyed without commit: nothing changed
+
+    writeFile("a.kdb-journal", "left by a writer of the old file that died");
+    StagedDatabase staged(file("a.kdb"));
+    staged.database().createTable({"tNew", {text("K", 5)}, {}});
+    EXPECT_TRUE(Database::open(file("a.kdb")).hasTable("tItems"));
+    staged.commit();
+    Database now = Database::open(file("a.kdb"));
+    EXPECT_EQ(now.tableNames(), QStringList{"tNew"});
+    EXPECT_EQ(now.locale(), kHebrewLocale);
+    EXPECT_EQ(files(), QStringList{"a.kdb"});
+}
+
+TEST_F(StagedDatabaseTest, ACopyPutInPlaceMustBeADatabaseOfOurs) {
+    create("source.kdb").createTable(itemsDef());
+    writeFile("junk.kdb", QByteArray(4096, 'x'));
+    EXPECT_JET_ERROR(err::kUnrecognizedFormat,
+                     StagedDatabase::copyOf(file("junk.kdb"), file("a.kdb")));
+    EXPECT_JET_ERROR(err::kFileNotFound, StagedDatabase::copyOf(file("none.kdb"), file("a.kdb")));
+    EXPECT_JET_ERROR(err::kBadPath, StagedDatabase(file("no/such/folder/a.kdb")));
+    EXPECT_EQ(files(), QStringList({"junk.kdb", "source.kdb"}));
+
+    StagedDatabase copy = StagedDatabase::copyOf(file("source.kdb"), file("a.kdb"));
+    EXPECT_FALSE(QFile::exists(file("a.kdb")));
+    copy.commit();
+    EXPECT_EQ(Database::open(file("a.kdb")).tableDef("tItems").fields, itemsDef().fields);
 }
 
 }  // namespace

@@ -74,17 +74,21 @@ TEST(UserPathsTest, FoldersOfTheUser) {
     EXPECT_EQ(userDataFolder(),
               QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation) + "/Etiquon");
 
-    // The private folder is made, or made private again, under the runtime folder.
+    // The private folder is made under the runtime folder; one that others may enter is
+    // refused, not repaired (the platform tests try the other ways it can be unfit).
     const QString expected =
         QStandardPaths::writableLocation(QStandardPaths::RuntimeLocation) + "/etiquon";
-    QDir().mkpath(expected);
-    QFile::setPermissions(expected, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner |
-                                        QFile::ReadOther | QFile::WriteOther | QFile::ExeOther);
+    QDir(expected).removeRecursively();
     QString error;
     EXPECT_EQ(privateTempFolder(&error), expected) << error.toStdString();
     EXPECT_EQ(QFileInfo(expected).permissions() &
                   (QFile::ReadOther | QFile::WriteOther | QFile::ReadGroup | QFile::WriteGroup),
               QFile::Permissions());
+    QFile::setPermissions(expected, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner |
+                                        QFile::ReadOther | QFile::WriteOther | QFile::ExeOther);
+    EXPECT_EQ(privateTempFolder(&error), QString());
+    EXPECT_TRUE(error.contains("other users may enter it")) << error.toStdString();
+    QFile::setPermissions(expected, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
 }
 
 }  // namespace

@@ -2,9 +2,11 @@
 // they leave in the item database and the print folder.
 #include <gtest/gtest.h>
 
+#include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QProcess>
+#include <QRegularExpression>
 #include <QTemporaryDir>
 
 #include "jet/database.h"
@@ -80,7 +82,9 @@ TEST_F(CliPrintTest, PrintItemsEndsWithThePagePath) {
     const ProcessResult r = cli5({"print-items", "--db", db()});
     ASSERT_EQ(r.exitCode, 0) << r.err.toStdString();
     const QString page = r.out.trimmed().split('\n').last();
-    EXPECT_TRUE(page.endsWith("/etiqon/etiqon1.htm")) << page.toStdString();
+    EXPECT_TRUE(page.endsWith("/etiqon1.htm")) << page.toStdString();
+    EXPECT_TRUE(QFileInfo(QFileInfo(page).path()).path().endsWith("/etiquon/etiqon"))
+        << page.toStdString();
     QFile file(page);
     ASSERT_TRUE(file.open(QIODevice::ReadOnly));
     EXPECT_EQ(file.readAll().count("<td class='L0'>"), 2);
@@ -93,6 +97,145 @@ TEST_F(CliPrintTest, PrintItemsWithLabelSoftwareChosenFails) {
     EXPECT_EQ(r.exitCode, 1);
     EXPECT_TRUE(r.err.contains("\"Direct\"")) << r.err.toStdString();
     EXPECT_EQ(cli5({"print-items"}).exitCode, 2);
+}
+
+// The same label settings for every run of these tests, under a SettingID of their own: the
+// item's name as text and its barcode as an EAN-13 bitmap.
+class CliPrintRunTest : public ::testing::Test {
+  protected:
+    void SetUp() override {
+        env = QProcessEnvironment::systemEnvironment();
+        env.insert("XDG_RUNTIME_DIR", runtime.path());
+        for (const char* kv :
+             {"0LabelDef UseCell True", "0LabelDef FldID 1", "1LabelDef UseCell True",
+              "1LabelDef FldID 4", "1LabelDef ViewType 1", "LabelBar BarType 6",
+              "GeneralParams OptOLE0 False", "GeneralParams OptOLE3 True"})
+            ASSERT_EQ(cli(QStringList{"config", "set"} + QString(kv).split(' ')).exitCode, 0);
+    }
+    ProcessResult cli(const QStringList& args) const {
+        return runProcess(ETIQUON_CLI, QStringList{"--setting-id", "6"} + args, env);
+    }
+
+    // A database folder whose items are named "<prefix> n" with EAN-13 barcodes of their own,
+    // all marked for printing.
+    QString folderWithItems(const QString& prefix, int firstBarcode, int count) {
+        const QString folder = dir.path() + "/" + prefix;
+        EXPECT_EQ(runProcess(ETIQUON_CLI, {"init-db", "--db", folder}).exitCode, 0);
+        jet::Database items = jet::Database::open(folder + "/etqnitm.kdb");
+        jet::Recordset rs = items.openRecordset("tItems");
+        for (int i = 0; i < count; ++i) {
+            rs.addNew();
+            rs.setValue("ItemKey", QString("%1%2").arg(prefix).arg(i, 3, 10, QLatin1Char('0')));
+            rs.setValue("ItemName", QString("%1 %2").arg(prefix).arg(i));
+            rs.setValue("BarCode", ean13(firstBarcode + i));
+            rs.setValue("Coin", QStringLiteral("¦"));
+            rs.setValue("Price", 1);
+            rs.setValue("Copies", 1);
+            rs.setValue("PrintLabel", true);
+            rs.update();
+        }
+        return folder;
+    }
+
+    // "729" and nine digits of n, with the check digit.
+    static QString ean13(int n) {
+        const QString digits = QString("729%1").arg(n, 9, 10, QLatin1Char('0'));
+        int sum = 0;
+        for (int i = 0; i < 12; ++i)
+            sum += digits[i].digitValue() * (i % 2 ? 3 : 1);
+        return digits + QString::number((10 - sum % 10) % 10);
+    }
+
+    QTemporaryDir dir;
+    QTemporaryDir runtime;
+    QProcessEnvironment env;
+};
+
+QStringList captures(const QString& text, const QString& pattern) {
+    QStringList out;
+    for (const QRegularExpressionMatch& m : QRegularExpression(pattern).globalMatch(text))
+        out << m.captured(1);
+    return out;
+}
+
+// Two print runs at once on two database folders: each page shows its own items, and the
+// bitmaps beside it, decoded by zbarimg, are its own items' barcodes.
+TEST_F(CliPrintRunTest, TwoRunsAtOnceEachShowOnlyTheirOwnLabels) {
+    constexpr int kItems = 30;
+    struct Run {
+        QString prefix;
+        int firstBarcode = 0;
+        QString folder{};
+        QProcess process{};
+    };
+    Run runs[2] = {{"Left", 1000}, {"Right", 5000}};
+    for (Run& run : runs)
+        run.folder = folderWithItems(run.prefix, run.firstBarcode, kItems);
+    for (int round = 0; round < 2; ++round) {
+        for (Run& run : runs) {
+            run.process.setProcessEnvironment(env);
+            run.process.start(ETIQUON_CLI,
+                              {"--setting-id", "6", "print-items", "--db", run.folder});
+        }
+        QStringList pages;
+        for (Run& run : runs) {
+            SCOPED_TRACE(run.prefix.toStdString());
+            ASSERT_TRUE(run.process.waitForFinished(180000));
+            ASSERT_EQ(run.process.exitCode(), 0) << run.process.readAllStandardError().data();
+            const QString page =
+                QString::fromUtf8(run.process.readAllStandardOutput()).trimmed().split('\n').last();
+            pages << page;
+            QFile file(page);
+            ASSERT_TRUE(file.open(QIODevice::ReadOnly)) << page.toStdString();
+            const QString html = QString::fromLatin1(file.readAll());
+            QStringList expectedNames, expectedBarcodes;
+            for (int i = 0; i < kItems; ++i) {
+                expectedNames << QString("%1 %2").arg(run.prefix).arg(i);
+                expectedBarcodes << ean13(run.firstBarcode + i);
+            }
+            QStringList names = captures(html, "<td class='L0'>([^<]*)</td>");
+            names.sort();
+            expectedNames.sort();
+            EXPECT_EQ(names, expectedNames);
+
+            QStringList bitmaps;
+            for (const QString& name : captures(html, "<img src='([^']*)'"))
+                bitmaps << QFileInfo(page).path() + "/" + name;
+            ASSERT_EQ(bitmaps.size(), kItems);
+            const ProcessResult decoded =
+                runProcess("zbarimg", QStringList{"-q", "--raw"} + bitmaps);
+            QStringList barcodes = decoded.out.split('\n', Qt::SkipEmptyParts);
+            barcodes.sort();
+            EXPECT_EQ(barcodes, expectedBarcodes) << decoded.err.toStdString();
+        }
+        EXPECT_NE(pages[0], pages[1]);
+    }
+}
+
+// A link planted where the print folder should be: the run is refused and the folder it points
+// at keeps its files and its mode.
+TEST_F(CliPrintRunTest, APlantedPrintFolderLinkIsRefused) {
+    const QString folder = folderWithItems("Item", 1000, 2);
+    const QString victim = dir.path() + "/victim";
+    ASSERT_TRUE(QDir().mkpath(victim));
+    ASSERT_TRUE(QFile::setPermissions(victim, QFile::ReadOwner | QFile::WriteOwner |
+                                                  QFile::ExeOwner | QFile::ReadOther |
+                                                  QFile::ExeOther));
+    QFile precious(victim + "/precious.txt");
+    ASSERT_TRUE(precious.open(QIODevice::WriteOnly));
+    precious.write("keep me");
+    precious.close();
+    ASSERT_TRUE(QDir().mkpath(runtime.path() + "/etiquon"));
+    ASSERT_TRUE(QFile::setPermissions(runtime.path() + "/etiquon",
+                                      QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner));
+    ASSERT_TRUE(QFile::link(victim, runtime.path() + "/etiquon/etiqon"));
+
+    const ProcessResult r = cli({"print-items", "--db", folder});
+    EXPECT_EQ(r.exitCode, 1);
+    EXPECT_TRUE(r.err.contains(runtime.path() + "/etiquon/etiqon")) << r.err.toStdString();
+    EXPECT_EQ(QDir(victim).entryList(QDir::AllEntries | QDir::NoDotAndDotDot),
+              QStringList{"precious.txt"});
+    EXPECT_TRUE(QFileInfo(victim).permissions() & QFile::ReadOther);
 }
 
 }  // namespace

@@ -1,0 +1,1 @@
+ItemKey >= 'A''1' And ItemName Like "*milk?" Or Val(Filter) = 3

@@ -1,0 +1,1 @@
+SELECT Format$(Date(), 'dd/mm/yy') AS D, [Number] FROM tStockLog WHERE DocDate < #12/31/2025# And Copies <> -1

@@ -1,0 +1,1 @@
+INSERT INTO tItems (ItemKey, ItemName, Copies, PrintLabel) VALUES ('10', "x" + 'y', 2, True)

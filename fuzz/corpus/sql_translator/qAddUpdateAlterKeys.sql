@@ -1,0 +1,1 @@
+UPDATE tTempAlterKeys LEFT JOIN tAlterKeys ON (tTempAlterKeys.AccountKey = tAlterKeys.AccountKey) AND (tTempAlterKeys.ItemKey = tAlterKeys.ItemKey) SET tAlterKeys.AccountKey = tTempAlterKeys.AccountKey, tAlterKeys.ItemKey = tTempAlterKeys.ItemKey, tAlterKeys.AlterNum = tTempAlterKeys.AlterNum

@@ -1,0 +1,1 @@
+UPDATE tTempAlterPrices LEFT JOIN tAlterPrices ON (tTempAlterPrices.AccountKey = tAlterPrices.AccountKey) AND (tTempAlterPrices.ItemKey = tAlterPrices.ItemKey) SET tAlterPrices.AccountKey = tTempAlterPrices.AccountKey, tAlterPrices.ItemKey = tTempAlterPrices.ItemKey, tAlterPrices.Price = tTempAlterPrices.Price, tAlterPrices.Coin = tTempAlterPrices.Coin

@@ -1,0 +1,1 @@
+UPDATE tTempPriceList LEFT JOIN tPriceList ON (tTempPriceList.ItemKey = tPriceList.ItemKey) AND (tTempPriceList.PriceList = tPriceList.PriceList) SET tPriceList.ItemKey = tTempPriceList.ItemKey, tPriceList.PriceList = tTempPriceList.PriceList, tPriceList.Price = tTempPriceList.Price, tPriceList.Currency = tTempPriceList.Currency

@@ -1,0 +1,1 @@
+SELECT ItemKey, ItemName, Unit, BarCode, Price FROM tItems ORDER BY tItems.Itemkey

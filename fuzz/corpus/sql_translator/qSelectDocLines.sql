@@ -1,0 +1,1 @@
+SELECT tTempDocLines.LineNum, tTempDocLines.ItemKey, tItems.ItemName, tTempDocLines.Quantity, tTempDocLines.Warehouse, tTempDocLines.Copies, tTempDocLines.Include FROM (tTempDocLines Inner Join tItems On tItems.ItemKey = tTempDocLines.ItemKey) ORDER BY tTempDocLines.HeadNumber, tTempDocLines.LineNum

@@ -1,0 +1,1 @@
+SELECT ItemKey, ItemName, Copies, PrintLabel FROM tItems ORDER BY tItems.PrintLabel, tItems.Itemkey

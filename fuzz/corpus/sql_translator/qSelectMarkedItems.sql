@@ -1,0 +1,1 @@
+SELECT ItemKey, ItemName, Copies, PrintLabel FROM tItems Where PrintLabel = True ORDER BY tItems.PrintLabel, tItems.Itemkey
