@@ -55,6 +55,10 @@ int getSetting(const SettingsStore& store, const QString& section, const QString
 
 int setSetting(SettingsStore& store, const QString& section, const QString& key,
                const QString& value) {
+    if (section.trimmed().isEmpty() || key.trimmed().isEmpty()) {
+        printError("config set takes a section and a key that are not empty");
+        return 2;
+    }
     store.write(section, key, value);
     QString error;
     if (!store.sync(&error)) {

@@ -11,6 +11,7 @@
 #include "db/local_databases.h"
 #include "db/schemas.h"
 #include "jet/database.h"
+#include "platform/folder_lock.h"
 
 namespace etq::cli {
 
@@ -103,6 +104,8 @@ int runInitDb(const QStringList& arguments) {
         return 2;
     }
     if (!prepareFolder(folder)) return 1;
+    std::optional<FolderLock> lock;
+    if (runReporting([&] { lock.emplace(folder); })) return 1;
     QTextStream out(stdout);
     const QString docDb = db::inFolder(folder, db::kDocDatabaseFile);
     const QString itemDb = db::inFolder(folder, db::kItemDatabaseFile);

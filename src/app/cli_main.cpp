@@ -1,5 +1,6 @@
 // etiquon-cli: the component's work without windows, for scripts, tests and the demo.
 #include <QCoreApplication>
+#include <QRegularExpression>
 #include <QTextStream>
 #include <cstdio>
 #include <span>
@@ -128,7 +129,18 @@ int main(int argc, char** argv) {
 
     // The shared options may stand before the command's name too.
     QStringList rest = args;
-    takeCommonOptions(rest);
+    const CommonOptions common = takeCommonOptions(rest);
+    // A hosting page's SettingID that is no number selects the plain settings; on the command
+    // line it is a mistake to be told.
+    if (args.contains("--setting-id") ||
+        !args.filter(QRegularExpression("^--setting-id=")).isEmpty()) {
+        if (etq::applicationNameFor(common.settingId) == etq::applicationNameFor({})) {
+            printError(
+                QString("--setting-id takes the number of a hosting page's settings, not '%1'")
+                    .arg(common.settingId));
+            return 2;
+        }
+    }
     if (rest.isEmpty()) {
         printHelp();
         return 2;

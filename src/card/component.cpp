@@ -1,11 +1,14 @@
 #include "card/component.h"
 
+#include <QFileInfo>
+
 #include "card/boundary.h"
 #include "card/card_controller.h"
 #include "card/import_adapters.h"
 #include "card/print_adapters.h"
 #include "db/local_databases.h"
 #include "platform/context.h"
+#include "platform/folder_lock.h"
 #include "print/label_definition.h"
 
 namespace etq {
@@ -15,8 +18,10 @@ void connectParts(CardController& controller, Surface& surface) {
     CardHooks& hooks = controller.hooks();
     hooks.upgradeItemDatabase = [&context](const QString& itemDatabase) {
         QString upgraded;
-        reportFailures(context, context.caption(1),
-                       [&] { upgraded = db::AddAccountTables(itemDatabase); });
+        reportFailures(context, context.caption(1), [&] {
+            const FolderLock lock(QFileInfo(itemDatabase).path());
+            upgraded = db::AddAccountTables(itemDatabase);
+        });
         return upgraded;
     };
     hooks.fillCmbPrice = [](const Surface& s, Context& c) { FillCmbPrice(s, c); };

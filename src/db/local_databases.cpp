@@ -6,6 +6,7 @@
 #include "db/schemas.h"
 #include "platform/context.h"
 #include "platform/failure.h"
+#include "platform/folder_lock.h"
 #include "platform/progress.h"
 
 namespace etq::db {
@@ -117,6 +118,9 @@ void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrice
 }
 
 void UpgradeItemDatabase(const QString& folder) {
+    if (!QFileInfo(folder).isDir())
+        throw Failure(QStringLiteral("There is no database folder %1").arg(folder));
+    const FolderLock lock(folder);
     const QString path = inFolder(folder, kItemDatabaseFile);
     if (!QFileInfo::exists(path)) return;
     // Account tables added to a file without its items would make a broken file look upgraded.

@@ -57,8 +57,9 @@ void CleanItemTables(const QString& itemDbPath, bool cleanItems, bool alterPrice
                      const Context& context, Progress& progress);
 
 // What the upgrade does with the database folder: adds the account tables to an existing item
-// database. A folder without one has nothing to upgrade, which is no failure; an item database
-// that is damaged or lacks its item tables is not upgraded (a Failure says why).
+// database, holding the folder's lock. A folder without one has nothing to upgrade, which is no
+// failure; a folder that does not exist, or an item database that is damaged or lacks its item
+// tables, is a Failure that says why.
 void UpgradeItemDatabase(const QString& folder);
 
 // The tables an item database cannot do without (the account tables come with the upgrade).

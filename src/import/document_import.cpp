@@ -10,6 +10,7 @@
 #include "jet/vb.h"
 #include "platform/context.h"
 #include "platform/failure.h"
+#include "platform/folder_lock.h"
 #include "platform/messages.h"
 #include "platform/progress.h"
 
@@ -112,6 +113,7 @@ DocImportResult importDocuments(const DocImportOptions& options, Context& contex
         throw BadSetting(
             QStringLiteral("The document import was asked to read items without an "
                            "item import to do it."));
+    const FolderLock lock(options.dbFolder);  // one run at a time rebuilds the folder's files
     const RunFiles files = prepareFiles(options);
     context.addressSeparator = options.addressSeparator;
 

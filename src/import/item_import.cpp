@@ -6,12 +6,14 @@
 #include "db/local_databases.h"
 #include "import/host_lists.h"
 #include "platform/context.h"
+#include "platform/folder_lock.h"
 #include "platform/progress.h"
 
 namespace etq {
 
 void importItems(const ItemImportOptions& options, const Context& context, Progress& progress) {
     const QString& folder = options.databaseFolder;
+    const FolderLock lock(folder);  // one run at a time rebuilds the folder's files
     const QString itemDb = db::inFolder(folder, db::kItemDatabaseFile);
     const auto showStep = [&](int caption) { progress.step(context.caption(caption)); };
 

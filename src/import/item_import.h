@@ -26,7 +26,9 @@ struct ItemImportOptions {
 // the progress's step (captions 31 to 38 in the context's language) and the bar moves.
 //
 // Returns when the run reached its end (the step then shows caption 38, "Scan is finished").
-// A failure throws and ends the run at that step: the engine's JetError or a Failure, among
+// The run holds the database folder's lock: while another run works there it throws FolderBusy
+// before touching anything. A failure throws and ends the run at that step: the engine's
+// JetError or a Failure, among
 // them those the window has always passed over without a word (a missing oitm.dbf, a currency
 // database that cannot be written). What was written before the stop is kept.
 void importItems(const ItemImportOptions& options, const Context& context, Progress& progress);

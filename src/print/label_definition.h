@@ -59,6 +59,12 @@ struct DirectLabelDef {
 
 inline constexpr int kLabelCellCount = 7;
 
+// The densest grid a sheet can hold: 100 rows and 40 columns of labels leave about 3 mm by
+// 5 mm a label on A4, below the smallest labels sold on sheets. A larger grid is a setting gone
+// wrong, and would write a page of gigabytes for a handful of labels.
+inline constexpr int kMaxPageRows = 100;
+inline constexpr int kMaxPageCols = 40;
+
 struct LabelDefinition {
     std::array<LabelCell, kLabelCellCount> cells;
     LabelBarDef bar;

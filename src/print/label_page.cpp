@@ -8,6 +8,7 @@
 #include "jet/database.h"
 #include "jet/recordset.h"
 #include "jet/vb.h"
+#include "platform/failure.h"
 #include "platform/label_fields.h"
 #include "platform/page_file.h"
 #include "platform/print_folder.h"
@@ -256,12 +257,22 @@ class LabelWriter {
 
 }  // namespace
 
+void requirePrintableGrid(const DirectLabelDef& page) {
+    if (page.PageRows > 0 && page.PageCols > 0 && page.PageRows <= kMaxPageRows &&
+        page.PageCols <= kMaxPageCols)
+        return;
+    throw BadSetting(
+        QStringLiteral(
+            "The label page has %1 rows and %2 columns; a sheet holds from 1 to %3 rows and from 1 to %4 columns of labels")
+            .arg(page.PageRows)
+            .arg(page.PageCols)
+            .arg(kMaxPageRows)
+            .arg(kMaxPageCols));
+}
+
 void writeLabelPage(const QString& fileName, const QString& dbName, LabelPageInput& input,
                     LabelDefinition& def, Progress& progress) {
-    if (def.page.PageRows <= 0 || def.page.PageCols <= 0)
-        failWith(QStringLiteral("The label page has %1 rows and %2 columns; both must be above 0")
-                     .arg(def.page.PageRows)
-                     .arg(def.page.PageCols));
+    requirePrintableGrid(def.page);
     prepareCells(input.query, def);
     if (QFile::exists(fileName) && !QFile::remove(fileName))
         failWith(QStringLiteral("Cannot delete %1").arg(fileName));
@@ -284,6 +295,7 @@ void writeLabelPage(const QString& fileName, const QString& dbName, LabelPageInp
 
 BuiltInPrint printBuiltInLabels(const QString& dbName, LabelPageInput& input, LabelDefinition& def,
                                 Progress& progress) {
+    requirePrintableGrid(def.page);
     // Built before the page ticks the cells' fields, as the page's own query is later.
     const QString sql = BuildLabelQuery(input.query);
     const PrintRunFolder run;

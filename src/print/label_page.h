@@ -13,6 +13,9 @@ class Progress;
 // The page file inside the print folder.
 inline const QString kLabelPageFile = QStringLiteral("etiqon1.htm");
 
+// Throws BadSetting for a grid of no labels or of more than a sheet can hold.
+void requirePrintableGrid(const DirectLabelDef& page);
+
 // What a label page shows besides the label definition: the label query's settings and the
 // number format of prices (blank: "0.00").
 struct LabelPageInput {

@@ -6,6 +6,7 @@
 
 #include "card/print_adapters.h"
 #include "platform/codepage1255.h"
+#include "platform/failure.h"
 #include "print/label_query.h"
 #include "print_fixture.h"
 
@@ -190,8 +191,12 @@ TEST_F(LabelPageTest, GridSizesGiveTheirShares) {
     def.page.PageRows = 1;
     def.page.PageCols = 12;
     EXPECT_TRUE(writePage().contains("    <td width='08.3%' height='100.0%' align='center'>"));
-    def.page.PageRows = 0;
-    EXPECT_THROW(writePage(), std::runtime_error);
+    // No labels, or more than a sheet can hold, is a setting to mend.
+    for (const auto [rows, columns] : {std::pair{0, 12}, {101, 4}, {1, 41}, {3000, 3000}}) {
+        def.page.PageRows = qint16(rows);
+        def.page.PageCols = qint16(columns);
+        EXPECT_THROW(writePage(), BadSetting) << rows << "x" << columns;
+    }
 }
 
 using PrintRunTest = LabelPageTest;
