@@ -92,8 +92,14 @@ QString CreateTempItemDatabase(const QString& tempPath, const QString& itemDbPat
     return tempPath;
 }
 
+void prepareForBulkWrites(Database& tempDb) {
+    tempDb.setScratch();
+    tempDb.setCacheSize(128);
+}
+
 void MergeTempItems(const QString& tempPath) {
     Database db = Database::open(tempPath);
+    prepareForBulkWrites(db);
     db.execute("qAddUpdateAlterKeys");
     db.execute("qAddUpdateAlterPrices");
     const QString priceMerge = db.querySql("qAddUpdatePriceList");

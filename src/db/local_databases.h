@@ -43,6 +43,11 @@ QString AddAccountTables(const QString& path);
 // the merge queries.
 QString CreateTempItemDatabase(const QString& tempPath, const QString& itemDbPath);
 
+// The temporary items database, open for a run that writes many rows through it: a scratch file
+// each run builds anew needs neither journal nor syncs, and the files its links reach get the
+// memory to keep a large transaction's pages (the item database stays journaled and synced).
+void prepareForBulkWrites(jet::Database& tempDb);
+
 // Merges the staged rows into the item database: alternate keys, special prices, then price
 // lists 1 to 10, one statement each. Rows staged with another price list number stay unmerged.
 // Does not report: a failing statement throws to the caller, and what ran before it stays.

@@ -3,10 +3,13 @@
 #include <QFileInfo>
 #include <optional>
 
+#include "db/local_databases.h"
 #include "import/host_reading.h"
 #include "import/public_functions.h"
 #include "jet/error.h"
+#include "jet/row_appender.h"
 #include "platform/failure.h"
+#include "platform/log.h"
 #include "platform/progress.h"
 
 namespace etq {
@@ -22,42 +25,35 @@ bool admitsKey(const ItemReadOptions& options, const QString& key) {
     return options.toKey.isEmpty() || QString::compare(key, options.toKey, Qt::CaseSensitive) <= 0;
 }
 
-int fieldIndex(const jet::Recordset& recordset, const char* name) {
-    const int index = recordset.fieldIndex(QString::fromLatin1(name));
-    if (index < 0)
-        jet::fail(jet::err::kItemNotFound,
-                  QStringLiteral("Item not found in this collection: %1.").arg(name));
-    return index;
+// The fields of tItems the reader writes, in the order of the row it makes. The first is the
+// key; the fields after kFirstAlways are written whatever the host holds, those before only when
+// the host has a text for them (otherwise the stored value stays, a new row's stays Null).
+enum ItemField {
+    kKey,
+    kName,
+    kForeignName,
+    kSort,
+    kUnit,
+    kBarcode,
+    kSupplierCatalogNumber,
+    kIgnoreInDoc,
+    kCopies,
+    kFirstAlways = kCopies,
+    kPrice,
+    kCoin,
+    kSalesPack,
+    kPurchasePack,
+};
+const QStringList kItemFields = {"ItemKey", "ItemName",   "Fname",       "ItemSort", "Unit",
+                                 "BarCode", "SuppCatNum", "IgnoreInDoc", "Copies",   "Price",
+                                 "Coin",    "SalPackUN",  "PurPackUN"};
+
+enum PriceListField { kListKey, kList, kListPrice, kListCurrency };
+const QStringList kPriceListFields = {"ItemKey", "PriceList", "Price", "Currency"};
+
+jet::RowAppender::Upsert itemUpsert() {
+    return {{kItemFields[kKey]}, kItemFields.mid(kName, kFirstAlways - kName)};
 }
-
-// The item fields the reader writes, found once.
-struct ItemFields {
-    explicit ItemFields(const jet::Recordset& items)
-        : key(fieldIndex(items, "ItemKey")),
-          name(fieldIndex(items, "ItemName")),
-          sort(fieldIndex(items, "ItemSort")),
-          unit(fieldIndex(items, "Unit")),
-          foreignName(fieldIndex(items, "Fname")),
-          barcode(fieldIndex(items, "BarCode")),
-          coin(fieldIndex(items, "Coin")),
-          price(fieldIndex(items, "Price")),
-          copies(fieldIndex(items, "Copies")),
-          supplierCatalogNumber(fieldIndex(items, "SuppCatNum")),
-          salesPack(fieldIndex(items, "SalPackUN")),
-          purchasePack(fieldIndex(items, "PurPackUN")),
-          ignoreInDoc(fieldIndex(items, "IgnoreInDoc")) {}
-    int key, name, sort, unit, foreignName, barcode, coin, price, copies, supplierCatalogNumber,
-        salesPack, purchasePack, ignoreInDoc;
-};
-
-struct PriceListFields {
-    explicit PriceListFields(const jet::Recordset& prices)
-        : key(fieldIndex(prices, "ItemKey")),
-          list(fieldIndex(prices, "PriceList")),
-          price(fieldIndex(prices, "Price")),
-          currency(fieldIndex(prices, "Currency")) {}
-    int key, list, price, currency;
-};
 
 // A price entry of the item file: the price in currency units and its currency.
 struct Price {
@@ -70,16 +66,17 @@ Price priceEntry(const DbfFile& file, qint64 record, int n) {
     return {file.int32(record, oitm::price(n).offset), code.isEmpty() ? kLocalCurrency : code};
 }
 
-// Reads host item records into tItems (and tTempPriceList) of an open database.
+// Reads host item records into tItems (and tTempPriceList) of an open database. A key the item
+// table holds has its row updated, a new key is added; the rows go in many at a time.
 class ItemImport {
   public:
     ItemImport(jet::Database& db, const ItemReadOptions& options)
-        : options_(options), items_(db.openRecordset(QStringLiteral("tItems"))), fields_(items_) {
-        if (!items_.eof()) items_.moveFirst();
-        if (options_.stagePriceLists) {
-            priceLists_ = db.openRecordset(QStringLiteral("tTempPriceList"));
-            priceListFields_.emplace(priceLists_);
-        }
+        : options_(options), items_(db, QStringLiteral("tItems"), kItemFields, itemUpsert()) {
+        // An item the host holds twice stages its prices once: the second rows are duplicates
+        // and are passed over.
+        if (options_.stagePriceLists)
+            priceLists_.emplace(db, QStringLiteral("tTempPriceList"), kPriceListFields,
+                                jet::RowAppender::SkipDuplicateKeys);
     }
 
     void read(const DbfFile& file, qint64 record) {
@@ -90,69 +87,64 @@ class ItemImport {
             wholeNumber16(file, record, oitm::kGroup) != *options_.group)
             return;
         const QString key = QuoteToApostrophe(hostKey);
-
-        items_.findFirst(QStringLiteral("ItemKey=") + criterionLiteral(key, u'"'));
-        if (items_.noMatch()) {
-            items_.addNew();
-            items_.setValue(fields_.key, key);
-        } else {
-            items_.edit();
-        }
-        setItemFields(file, record);
+        setItemFields(file, record, key);
         if (options_.stagePriceLists) stagePrices(file, record, key);
-        updateUnlessDuplicate(items_);
+        items_.addRow();
+        if (items_.pendingRows() >= kRowsPerWrite) write();
+    }
+
+    // Writes the rows made so far; a reader that stops keeps what it read before the failure.
+    void write() {
+        items_.write();
+        if (priceLists_) priceLists_->write();
     }
 
   private:
-    // A field read from the host is written only when the host has a text for it; otherwise
-    // the stored value stays (a new row's stays null).
+    static constexpr int kRowsPerWrite = 1000;
+
     void setIfGiven(int field, const QString& text) {
-        if (!text.isEmpty()) items_.setValue(field, text);
+        if (!text.isEmpty()) items_.setText(field, text);
     }
 
-    void setItemFields(const DbfFile& file, qint64 record) {
+    void setItemFields(const DbfFile& file, qint64 record, const QString& key) {
+        items_.setText(kKey, key);
         const QString foreignName = file.text(record, oitm::kForeignName);
         // With foreign names a blank foreign name leaves ItemName alone: the Hebrew name does
         // not stand in for it.
-        setIfGiven(fields_.name,
-                   options_.foreignNames ? foreignName : file.text(record, oitm::kItemName));
-        setIfGiven(fields_.foreignName, foreignName);
+        setIfGiven(kName, options_.foreignNames ? foreignName : file.text(record, oitm::kItemName));
+        setIfGiven(kForeignName, foreignName);
         if (!file.text(record, oitm::kGroup).isEmpty())
-            items_.setValue(fields_.sort, wholeNumber16(file, record, oitm::kGroup));
-        setIfGiven(fields_.unit, file.text(record, oitm::kUnit));
-        setIfGiven(fields_.barcode, file.text(record, oitm::kBarcode));
-        setIfGiven(fields_.supplierCatalogNumber, file.text(record, oitm::kSupplierCatalogNumber));
-        items_.setValue(fields_.copies, options_.copies);
-        const Price price = priceEntry(file, record, options_.priceField);
-        items_.setValue(fields_.price, price.hundredths / 100.0);
-        items_.setValue(fields_.coin, price.currency);
-        items_.setValue(fields_.salesPack, 1.0);
-        items_.setValue(fields_.purchasePack, 1.0);
+            items_.setNumber(kSort, wholeNumber16(file, record, oitm::kGroup));
+        setIfGiven(kUnit, file.text(record, oitm::kUnit));
+        setIfGiven(kBarcode, file.text(record, oitm::kBarcode));
+        setIfGiven(kSupplierCatalogNumber, file.text(record, oitm::kSupplierCatalogNumber));
         if (options_.queryGroup && !file.text(record, oitm::kQueryGroups).isEmpty())
-            items_.setValue(fields_.ignoreInDoc, options_.queryGroup->ignoreInDoc(wholeNumber32(
-                                                     file, record, oitm::kQueryGroups)));
+            items_.setYesNo(kIgnoreInDoc, options_.queryGroup->ignoreInDoc(
+                                              wholeNumber32(file, record, oitm::kQueryGroups)));
+        items_.setNumber(kCopies, options_.copies);
+        const Price price = priceEntry(file, record, options_.priceField);
+        items_.setDouble(kPrice, price.hundredths / 100.0);
+        items_.setText(kCoin, price.currency);
+        items_.setDouble(kSalesPack, 1.0);
+        items_.setDouble(kPurchasePack, 1.0);
     }
 
-    // Every price entry with a price becomes a row of its price list. An item the host holds
-    // twice stages its prices once: the second rows are duplicates and are passed over.
+    // Every price entry with a price becomes a row of its price list.
     void stagePrices(const DbfFile& file, qint64 record, const QString& key) {
         for (int n = 1; n <= oitm::kPriceCount; ++n) {
             const Price price = priceEntry(file, record, n);
             if (price.hundredths == 0) continue;
-            priceLists_.addNew();
-            priceLists_.setValue(priceListFields_->key, key);
-            priceLists_.setValue(priceListFields_->list, n);
-            priceLists_.setValue(priceListFields_->price, price.hundredths / 100.0);
-            priceLists_.setValue(priceListFields_->currency, price.currency);
-            updateUnlessDuplicate(priceLists_);
+            priceLists_->setText(kListKey, key);
+            priceLists_->setNumber(kList, n);
+            priceLists_->setDouble(kListPrice, price.hundredths / 100.0);
+            priceLists_->setText(kListCurrency, price.currency);
+            priceLists_->addRow();
         }
     }
 
     const ItemReadOptions& options_;
-    jet::Recordset items_;
-    ItemFields fields_;
-    jet::Recordset priceLists_;
-    std::optional<PriceListFields> priceListFields_;
+    jet::RowAppender items_;
+    std::optional<jet::RowAppender> priceLists_;
 };
 
 void requirePriceField(int priceField, const QString& path) {
@@ -178,13 +170,25 @@ void readHostItems(const ItemReadOptions& options, Progress& progress) {
         throw HostFileMissing(QStringLiteral("There is no item file %1").arg(path));
 
     jet::Database db = jet::Database::open(options.databasePath);
+    db::prepareForBulkWrites(db);
     ItemImport import(db, options);
     const DbfFile file = openHostFile(path, oitm::kLayout);
     requirePriceField(options.priceField, path);
 
     KeptWrites writes(db);
-    forEachRecord(
-        file, [&](qint64 record) { import.read(file, record); }, &progress, 5);
+    try {
+        forEachRecord(
+            file, [&](qint64 record) { import.read(file, record); }, &progress, 5);
+    } catch (...) {
+        // The items before the one that failed stay written, as they always have.
+        try {
+            import.write();
+        } catch (const std::exception& e) {
+            qCWarning(log::import) << "keeping the items read before the failure:" << describe(e);
+        }
+        throw;
+    }
+    import.write();
     writes.commit();
     progress.clear();
 }

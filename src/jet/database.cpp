@@ -348,7 +348,19 @@ Recordset Database::openRecordset(const QString& source) {
 
 void Database::setCacheSize(int mebibytes) {
     if (mebibytes < 1) fail(err::kInvalidArgument, "A cache needs at least 1 MiB.");
-    connection().exec(QString("PRAGMA main.cache_size = -%1").arg(qint64(mebibytes) * 1024));
+    QStringList schemas;
+    for (Stmt list = connection().prepare("PRAGMA database_list", false); list.step();)
+        schemas << list.column(1).toString();
+    for (const QString& schema : schemas)
+        if (schema != u"temp")
+            connection().exec(QString("PRAGMA %1.cache_size = -%2")
+                                  .arg(sql::quoteName(schema))
+                                  .arg(qint64(mebibytes) * 1024));
+}
+
+void Database::setScratch() {
+    connection().exec("PRAGMA main.journal_mode = OFF");
+    connection().exec("PRAGMA main.synchronous = OFF");
 }
 
 void Database::beginTrans() {

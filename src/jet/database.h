@@ -65,10 +65,13 @@ class Database {
     // A recordset over a table, a saved select query or a SELECT statement.
     Recordset openRecordset(const QString& source);
 
-    // Memory for the pages of the file itself (its links keep theirs), in MiB; 16 until set. A
-    // run that writes a large table in one transaction gives it more, so that the engine does not
-    // write (and sync) pages half-way through the transaction.
+    // Memory for the pages of the file and of each file its links reach, in MiB a file; 16 for
+    // the file itself until set. A run that writes a large table in one transaction gives it
+    // more, so that the engine does not write (and sync) pages half-way through the transaction.
     void setCacheSize(int mebibytes);
+    // The file holds nothing that must outlive a crash (a scratch file each run builds anew):
+    // its writes skip the rollback journal and the syncs. The files its links reach keep both.
+    void setScratch();
 
     void beginTrans();
     void commitTrans();

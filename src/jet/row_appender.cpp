@@ -11,8 +11,11 @@ namespace etq::jet {
 
 namespace {
 
-// SQLite takes at most this many parameters in one statement.
+// Rows go in by statements of a fixed number of rows, so that each statement is prepared once
+// (a statement for every count of waiting rows costs more to prepare than to run); the rows left
+// over go in one by one. SQLite takes at most 32766 parameters in one statement.
 constexpr int kMaxParameters = 32766;
+constexpr int kRowsPerStatement = 256;
 
 bool fitsWhole(FieldType type, qint64 n) {
     switch (type) {
@@ -33,7 +36,7 @@ bool fitsWhole(FieldType type, qint64 n) {
 
 RowAppender::RowAppender(Database& db, const QString& table, const QStringList& fields,
                          Duplicates duplicates)
-    : db_(db), duplicates_(duplicates) {
+    : db_(db) {
     const TableDef def = db.tableDef(table);
     table_ = def.name;
     for (const QString& name : fields) {
@@ -46,6 +49,30 @@ RowAppender::RowAppender(Database& db, const QString& table, const QStringList& 
     }
     if (fields_.isEmpty()) fail(err::kInvalidArgument, "Rows to append need at least one field.");
     current_.resize(size_t(fields_.size()));
+    // Only a uniqueness conflict is passed over: a broken field rule still fails.
+    if (duplicates == SkipDuplicateKeys)
+        conflictClause_ = QStringLiteral(" ON CONFLICT DO NOTHING");
+}
+
+RowAppender::RowAppender(Database& db, const QString& table, const QStringList& fields,
+                         const Upsert& upsert)
+    : RowAppender(db, table, fields, FailOnDuplicateKey) {
+    QStringList key, sets;
+    for (const QString& name : upsert.key)
+        key << sql::quoteName(name);
+    for (const FieldDef& f : fields_) {
+        if (upsert.key.contains(f.name, Qt::CaseInsensitive)) continue;
+        const QString name = sql::quoteName(f.name);
+        // In DO UPDATE a bare name is the stored row's field, "excluded." the new row's.
+        sets << (upsert.keepWhenNull.contains(f.name, Qt::CaseInsensitive)
+                     ? QString("%1 = COALESCE(excluded.%1, %1)").arg(name)
+                     : QString("%1 = excluded.%1").arg(name));
+    }
+    if (key.isEmpty()) fail(err::kInvalidArgument, "An upsert needs the fields of its key.");
+    conflictClause_ =
+        sets.isEmpty()
+            ? QString(" ON CONFLICT(%1) DO NOTHING").arg(key.join(", "))
+            : QString(" ON CONFLICT(%1) DO UPDATE SET %2").arg(key.join(", "), sets.join(", "));
 }
 
 RowAppender::~RowAppender() = default;
@@ -144,15 +171,24 @@ void RowAppender::addRow() {
 
 int RowAppender::write() {
     const int rows = pendingRows();
-    const int perStatement = std::max(1, kMaxParameters / int(fields_.size()));
+    const int perStatement = std::clamp(kMaxParameters / int(fields_.size()), 1, kRowsPerStatement);
     int written = 0;
+    // The statements of one write go in whole or not at all.
+    detail::Connection& connection = db_.connection();
+    connection.exec("SAVEPOINT row_appender");
     try {
-        for (int first = 0; first < rows; first += perStatement)
-            written += writeRows(first, std::min(perStatement, rows - first));
+        int first = 0;
+        for (; first + perStatement <= rows; first += perStatement)
+            written += writeRows(first, perStatement);
+        for (; first < rows; ++first)
+            written += writeRows(first, 1);
     } catch (...) {
         pending_.clear();
+        connection.exec("ROLLBACK TO row_appender");
+        connection.exec("RELEASE row_appender");
         throw;
     }
+    connection.exec("RELEASE row_appender");
     pending_.clear();
     return written;
 }
@@ -169,10 +205,9 @@ detail::Stmt& RowAppender::statementFor(int rows) {
     QStringList values;
     for (int r = 0; r < rows; ++r)
         values << row;
-    QString text = QString("INSERT INTO %1 (%2) VALUES %3")
-                       .arg(sql::quoteName(table_), names.join(", "), values.join(u','));
-    // Only a uniqueness conflict is passed over: a broken field rule still fails.
-    if (duplicates_ == SkipDuplicateKeys) text += QStringLiteral(" ON CONFLICT DO NOTHING");
+    const QString text = QString("INSERT INTO %1 (%2) VALUES %3")
+                             .arg(sql::quoteName(table_), names.join(", "), values.join(u',')) +
+                         conflictClause_;
     statement = std::make_unique<detail::Stmt>(db_.connection().prepare(text, false));
     return *statement;
 }

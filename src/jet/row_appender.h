@@ -8,7 +8,10 @@
 // set, and fails with the same error (3163 too long, 3315 empty text, 3349 overflow, 3421 no
 // conversion); a key that is there already fails with 3022. With SkipDuplicateKeys a row whose
 // key is there already (or comes twice in one write) is left out and the others are written, as
-// the readers have always passed over duplicates; any other failure still fails the write.
+// the readers have always passed over duplicates; any other failure still fails the write. With
+// an Upsert, a row whose key is there already is written over the stored row instead, as a
+// reader that finds a key and edits its row does: the key stays, and a field the reader leaves
+// alone when the host has nothing for it keeps its stored value where the new one is Null.
 //
 // The caller holds the transaction; the appender writes only in write(). A failed write writes
 // none of its rows and drops them.
@@ -35,9 +38,18 @@ class RowAppender {
   public:
     enum Duplicates { FailOnDuplicateKey, SkipDuplicateKeys };
 
+    // What an Upsert writes over a stored row with the same `key` (fields of a unique index).
+    struct Upsert {
+        QStringList key;
+        QStringList keepWhenNull;  // fields that keep their stored value where the new is Null
+    };
+
     // Rows of `table` (local or linked) setting `fields`, which the table must have (3265).
     RowAppender(Database& db, const QString& table, const QStringList& fields,
                 Duplicates duplicates = FailOnDuplicateKey);
+    // Rows that update the stored row of their key, or are added when there is none.
+    RowAppender(Database& db, const QString& table, const QStringList& fields,
+                const Upsert& upsert);
     ~RowAppender();
     RowAppender(const RowAppender&) = delete;
     RowAppender& operator=(const RowAppender&) = delete;
@@ -76,7 +88,7 @@ class RowAppender {
     Database db_;  // a copy keeps the file open while the appender lives
     QString table_;
     QList<FieldDef> fields_;
-    Duplicates duplicates_;
+    QString conflictClause_;  // what follows the VALUES of the statement
     std::vector<Value> current_;
     std::vector<Value> pending_;  // rows in order, fields_.size() values each
     std::map<int, std::unique_ptr<detail::Stmt>> statements_;  // by the rows they take
