@@ -1,12 +1,17 @@
-// The document line selection's query text and its grids on a real working database, and the
-// choice of the document types a document import scans.
-#include "dialogs/doc_line_selection.h"
+// The document line selection's query text and its grids on a real working database, the
+// choice of the document types a document import scans, and the two document windows offscreen.
+#include <QPushButton>
+#include <QTableView>
 
 #include "db/db_fixture.h"
 #include "dialogs/bound_grid_model.h"
+#include "dialogs/doc_line_selection.h"
 #include "dialogs/doc_lines_query.h"
 #include "dialogs/doc_types.h"
+#include "dialogs/edit_ranges_window.h"
+#include "dialogs/select_doc_item_window.h"
 #include "jet/error.h"
+#include "platform/captions.h"
 
 namespace etq::dialogs::test {
 namespace {
@@ -103,6 +108,84 @@ TEST_F(DocLineSelectionTest, DocumentTypesToScanAreKeptInTheDocumentDatabase) {
     EXPECT_EQ(types[3], (DocTypeRow{4, "הזמנת לקוח", true, false}));
     EXPECT_EQ(types[6].type, 12);
     EXPECT_THROW(setDocTypeFlags(docDb, 9, true, true), jet::JetError);
+}
+
+QString header(const QAbstractItemModel& model, int column) {
+    return model.headerData(column, Qt::Horizontal, Qt::DisplayRole).toString();
+}
+
+int alignment(const QAbstractItemModel& model, int column) {
+    return model.data(model.index(0, column), Qt::TextAlignmentRole).toInt();
+}
+
+void click(QWidget& window, const char* name) {
+    window.findChild<QPushButton*>(name)->click();
+}
+
+// Documents and lines in two grids: a change of document shows its lines, the buttons and the
+// grids' own edits write straight through.
+TEST_F(DocLineSelectionTest, WindowShowsTheLinesOfTheCurrentDocument) {
+    SelectDocItemWindow window(dir.path(), 0);
+    EXPECT_EQ(window.windowTitle(), "בחירת שורות מסמכים להדפסה");
+    auto* documentView = window.findChild<QTableView*>("VSDocHeaders");
+    ASSERT_EQ(window.documents().rowCount(), 2);
+    EXPECT_TRUE(documentView->isColumnHidden(6));
+    EXPECT_TRUE(documentView->isColumnHidden(7));
+    EXPECT_FALSE(documentView->isColumnHidden(5));
+    EXPECT_EQ(header(window.documents(), 0), GetCaption(7, 0));
+    EXPECT_EQ(header(window.documents(), 5), GetCaption(12, 0));
+    EXPECT_EQ(header(window.lines(), 6), GetCaption(19, 0));
+    EXPECT_EQ(alignment(window.lines(), 0), int(Qt::AlignRight | Qt::AlignVCenter));
+    ASSERT_EQ(window.lines().rowCount(), 2);
+
+    documentView->setCurrentIndex(window.documents().index(1, 0));
+    EXPECT_EQ(window.selection().currentDocument(), 1);
+    click(window, "cmdNoneLines");
+    click(window, "CmdAllHeaders");
+    QAbstractItemModel& lines = window.lines();
+    EXPECT_TRUE(lines.setData(lines.index(0, 5), "4", Qt::EditRole));
+    EXPECT_EQ(
+        stored("SELECT WizFileID, LineNum, Copies, Include FROM tTempDocLines ORDER BY "
+               "WizFileID, LineNum"),
+        (QStringList{"1|1|2|True", "1|2|3|True", "1|3|1|True", "2|1|4|False", "2|2|1|False"}));
+    EXPECT_EQ(stored("SELECT Include FROM tTempDocHeaders"), (QStringList{"True", "True"}));
+
+    SelectDocItemWindow english(dir.path(), 1);
+    EXPECT_EQ(english.windowTitle(), "Selecting document items for print");
+    EXPECT_EQ(english.layoutDirection(), Qt::LeftToRight);
+    EXPECT_EQ(english.findChild<QPushButton*>("cmdNoneHeaders")->text(), "Unselect all");
+    EXPECT_EQ(header(english.lines(), 5), "Copies");
+    EXPECT_EQ(alignment(english.documents(), 0), int(Qt::AlignLeft | Qt::AlignVCenter));
+}
+
+TEST_F(DocLineSelectionTest, RangesWindowEditsAndResetsTheNextScanStart) {
+    {
+        jet::Database docs = jet::Database::open(path(db::kDocDatabaseFile));
+        docs.execute("UPDATE tWizFileRanges SET LastIndx = 7, FromIndx = 8");
+    }
+    EditRangesWindow window(dir.path(), 0);
+    QAbstractItemModel& grid = window.grid();
+    ASSERT_EQ(grid.rowCount(), 7);
+    EXPECT_EQ(header(grid, 0), GetCaption(4, 0));
+    EXPECT_EQ(header(grid, 2), GetCaption(6, 0));
+    EXPECT_EQ(alignment(grid, 2), int(Qt::AlignRight | Qt::AlignVCenter));
+    EXPECT_TRUE(grid.setData(grid.index(1, 2), "3", Qt::EditRole));
+    jet::Database docs = jet::Database::open(path(db::kDocDatabaseFile));
+    EXPECT_EQ(rows(docs, "SELECT FromIndx FROM tWizFileRanges WHERE WizFileID = 2"),
+              QStringList{"3"});
+    click(window, "cmdNoneItems");
+    EXPECT_EQ(grid.data(grid.index(1, 2), Qt::DisplayRole).toString(), "0");
+    EXPECT_EQ(rows(docs, "SELECT DISTINCT LastIndx, FromIndx FROM tWizFileRanges"),
+              QStringList{"7|0"});
+
+    EditRangesWindow english(dir.path(), 1);
+    EXPECT_EQ(english.windowTitle(), "Documents special numerators");
+    EXPECT_EQ(english.layoutDirection(), Qt::LeftToRight);
+    EXPECT_EQ(header(english.grid(), 2), "Next scan start");
+    EXPECT_EQ(english.findChild<QPushButton*>("cmdNoneItems")->text(), "Reset all");
+
+    EditRangesWindow nowhere(dir.path() + "/missing", 0);  // nothing to show, and no failure
+    EXPECT_EQ(nowhere.grid().rowCount(), 0);
 }
 
 }  // namespace
