@@ -69,12 +69,22 @@ int runReporting(const std::function<void()>& work) {
     }
 }
 
-int runConfig(const QStringList& args);       // cli_config.cpp
-int runInitDb(const QStringList& args);       // cli_db.cpp
-int runUpgrade(const QStringList& args);      // cli_db.cpp
-int runImportItems(const QStringList& args);  // cli_import.cpp
-int runMarkItems(const QStringList& args);    // cli_print.cpp
-int runPrintItems(const QStringList& args);   // cli_print.cpp
+int runConfig(const QStringList& args);        // cli_config.cpp
+int runInitDb(const QStringList& args);        // cli_db.cpp
+int runUpgrade(const QStringList& args);       // cli_db.cpp
+int runImportItems(const QStringList& args);   // cli_import.cpp
+int runMarkItems(const QStringList& args);     // cli_print.cpp
+int runPrintItems(const QStringList& args);    // cli_print.cpp
+int runImportDocs(const QStringList& args);    // cli_import.cpp
+int runPrintDocs(const QStringList& args);     // cli_print.cpp
+int runScanRanges(const QStringList& args);    // cli_docs.cpp
+int runDocTypes(const QStringList& args);      // cli_docs.cpp
+int runListDocs(const QStringList& args);      // cli_docs.cpp
+int runIncludeDocs(const QStringList& args);   // cli_docs.cpp
+int runExcludeDocs(const QStringList& args);   // cli_docs.cpp
+int runIncludeLines(const QStringList& args);  // cli_docs.cpp
+int runExcludeLines(const QStringList& args);  // cli_docs.cpp
+int runSetCopies(const QStringList& args);     // cli_docs.cpp
 
 namespace {
 
@@ -95,6 +105,29 @@ const Command kCommands[] = {
      "mark items for printing and set their copies", runMarkItems},
     {"print-items", "--db DIR [--open]", "print the marked items' labels; prints the page's path",
      runPrintItems},
+    {"import-docs",
+     "--company DIR --db DIR [--from-date DD/MM/YYYY] [--to-date DD/MM/YYYY] [--from-num N] [--to-num N] [--read-items] [--fast]",
+     "read the host's stock documents of the types to scan into the working database",
+     runImportDocs},
+    {"doc-types", "--db DIR [--scan TYPES] [--no-scan TYPES] [--drafts TYPES] [--no-drafts TYPES]",
+     "show and choose the document types read, and their drafts (TYPES: 1,2,5 or all)",
+     runDocTypes},
+    {"scan-ranges", "--db DIR [--reset]",
+     "show where each document file's next scan starts; --reset starts them all anew",
+     runScanRanges},
+    {"list-docs", "--db DIR [--lines] [DOC...]",
+     "list the imported documents (DOC: file/number, as 1/101), with their lines", runListDocs},
+    {"include-docs", "--db DIR (--all | DOC...)", "choose documents for printing", runIncludeDocs},
+    {"exclude-docs", "--db DIR (--all | DOC...)", "leave documents out of printing",
+     runExcludeDocs},
+    {"include-lines", "--db DIR DOC (--all | LINE...)", "choose lines of a document for printing",
+     runIncludeLines},
+    {"exclude-lines", "--db DIR DOC (--all | LINE...)", "leave lines of a document out of printing",
+     runExcludeLines},
+    {"set-copies", "--db DIR DOC LINE COPIES", "set the label copies of a document line",
+     runSetCopies},
+    {"print-docs", "--db DIR [--open]",
+     "print the included document lines' labels; prints the page's path", runPrintDocs},
 };
 
 void printHelp() {
