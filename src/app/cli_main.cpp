@@ -69,22 +69,24 @@ int runReporting(const std::function<void()>& work) {
     }
 }
 
-int runConfig(const QStringList& args);        // cli_config.cpp
-int runInitDb(const QStringList& args);        // cli_db.cpp
-int runUpgrade(const QStringList& args);       // cli_db.cpp
-int runImportItems(const QStringList& args);   // cli_import.cpp
-int runMarkItems(const QStringList& args);     // cli_print.cpp
-int runPrintItems(const QStringList& args);    // cli_print.cpp
-int runImportDocs(const QStringList& args);    // cli_import.cpp
-int runPrintDocs(const QStringList& args);     // cli_print.cpp
-int runScanRanges(const QStringList& args);    // cli_docs.cpp
-int runDocTypes(const QStringList& args);      // cli_docs.cpp
-int runListDocs(const QStringList& args);      // cli_docs.cpp
-int runIncludeDocs(const QStringList& args);   // cli_docs.cpp
-int runExcludeDocs(const QStringList& args);   // cli_docs.cpp
-int runIncludeLines(const QStringList& args);  // cli_docs.cpp
-int runExcludeLines(const QStringList& args);  // cli_docs.cpp
-int runSetCopies(const QStringList& args);     // cli_docs.cpp
+int runConfig(const QStringList& args);       // cli_config.cpp
+int runInitDb(const QStringList& args);       // cli_db.cpp
+int runUpgrade(const QStringList& args);      // cli_db.cpp
+int runImportItems(const QStringList& args);  // cli_import.cpp
+int runMarkItems(const QStringList& args);    // cli_print.cpp
+int runPrintItems(const QStringList& args);   // cli_print.cpp
+
+// The document road.
+int runImportDocs(const QStringList& args);  // cli_import.cpp
+int runPrintDocs(const QStringList& args);   // cli_print.cpp
+int runScanRanges(const QStringList& args);  // cli_docs.cpp, as the rest
+int runDocTypes(const QStringList& args);
+int runListDocs(const QStringList& args);
+int runIncludeDocs(const QStringList& args);
+int runExcludeDocs(const QStringList& args);
+int runIncludeLines(const QStringList& args);
+int runExcludeLines(const QStringList& args);
+int runSetCopies(const QStringList& args);
 
 namespace {
 

@@ -110,6 +110,19 @@ TEST_F(DocsCliTest, DocumentsLinesAndCopiesAreChosenForPrinting) {
     const ProcessResult printed = cli({"print-docs", "--db", folder()});
     EXPECT_EQ(printed.exitCode, 0) << printed.err.toStdString();
     EXPECT_TRUE(QFileInfo(printed.out.trimmed().split('\n').last()).isFile());
+
+    // The fast way, as saved in the settings: the documents are read again first, all included.
+    for (const QStringList& kv : {QStringList{"LabelByDocs", "OnlyLine0", "1"},
+                                  {"LabelByDocs", "UseFastWay", "1"},
+                                  {"LabelByDocs", "ToDate", "31/12/2030"},
+                                  {"Params", "ConnServer", dir.path()},
+                                  {"Params", "ConnDataBase", "company"},
+                                  {"GeneralParams", "DBPath", "/nowhere"}})
+        ASSERT_EQ(cli(QStringList{"config", "set"} + kv).exitCode, 0);
+    ASSERT_EQ(cli({"scan-ranges", "--db", folder(), "--reset"}).exitCode, 0);
+    const ProcessResult fast = cli({"print-docs", "--db", folder()});
+    EXPECT_EQ(fast.exitCode, 0) << fast.err.toStdString();
+    EXPECT_EQ(work("SELECT count(*) FROM tTempDocHeaders WHERE Include"), QStringList{"11"});
 }
 
 }  // namespace
