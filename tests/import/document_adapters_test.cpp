@@ -111,12 +111,14 @@ TEST_F(DocumentAdaptersTest, ImportReadsTheTabsSettings) {
     EXPECT_TRUE(QFile::exists(path(db::kLogDatabaseFile)));
     EXPECT_TRUE(jet::Database::open(path(db::kWorkDatabaseFile)).hasTable("tStockLog"));
 
+    // No date: the run does not start, and the documents chosen before are kept.
     c("txtToDocNum").setText("");
-    c("txtFromDate").setText("32/x/2025");  // no date: the run does not start
+    c("txtFromDate").setText("32/x/2025");
     EXPECT_FALSE(ImportDocs(surface, context));
     ASSERT_EQ(critical().size(), 1);
     EXPECT_TRUE(critical()[0].contains("32/x/2025"));
     EXPECT_EQ(range(), "0|0");
+    EXPECT_EQ(numbers(), (QStringList{"2", "4"}));
 }
 
 // A damaged document file is told at once, with the error title; a missing one is not; the run
