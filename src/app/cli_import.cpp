@@ -1,4 +1,5 @@
-// etiquon-cli import-items: the item import run of the reading-items tab, without windows.
+// etiquon-cli import-items and import-docs: the item import run of the reading-items tab and the
+// document import of the tab of labels by documents, without windows.
 #include <unistd.h>
 
 #include <QDir>
@@ -9,6 +10,7 @@
 #include <optional>
 
 #include "app/cli_command.h"
+#include "card/document_adapters.h"
 #include "card/import_adapters.h"
 #include "db/file_names.h"
 #include "import/item_import.h"
@@ -195,6 +197,97 @@ int runImportItems(const QStringList& arguments) {
     }
     QTextStream(stdout) << progress.lastStep() << Qt::endl;
     return 0;
+}
+
+namespace {
+
+const char kDocsUsage[] =
+    "usage: etiquon-cli import-docs --company DIR --db DIR [--from-date DD/MM/YYYY] [--to-date DD/MM/YYYY] [--from-num N] [--to-num N] [--read-items] [--fast] [--setting-id N]";
+
+// A document number given on the command line: a whole number of 32 bits.
+bool isDocumentNumber(const std::optional<QString>& text) {
+    bool ok = true;
+    if (text) text->trimmed().toInt(&ok);
+    return ok;
+}
+
+QString describeRead(const DocTypeRead& read) {
+    const StockDocScan& scan = read.scan;
+    QString line = QStringLiteral("document type %1: ").arg(read.docType);
+    if (read.failure) return line + QStringLiteral("not read");
+    if (scan.recordCount == 0) return line + QStringLiteral("no records");
+    if (scan.firstRecord >= scan.recordCount)
+        return line + QStringLiteral("no records after record %1").arg(scan.recordCount);
+    line += QStringLiteral("records %1 to %2: %3 documents, %4 lines")
+                .arg(scan.firstRecord + 1)
+                .arg(scan.recordCount)
+                .arg(scan.headers)
+                .arg(scan.lines);
+    if (read.itemsImported) line += QStringLiteral(", their items imported");
+    return line;
+}
+
+}  // namespace
+
+int runImportDocs(const QStringList& arguments) {
+    QStringList args = arguments;
+    const CommonOptions common = takeCommonOptions(args);
+    const QString company = takeOption(args, "--company");
+    const QString folder = takeOption(args, "--db");
+    const std::optional<QString> fromDate = takeValue(args, "--from-date");
+    const std::optional<QString> toDate = takeValue(args, "--to-date");
+    const std::optional<QString> fromNumber = takeValue(args, "--from-num");
+    const std::optional<QString> toNumber = takeValue(args, "--to-num");
+    const bool readItems = takeFlag(args, "--read-items");
+    const bool fast = takeFlag(args, "--fast");
+    if (company.isEmpty() || folder.isEmpty() || !args.isEmpty()) {
+        printError(kDocsUsage);
+        return 2;
+    }
+    for (const auto& number : {fromNumber, toNumber}) {
+        if (isDocumentNumber(number)) continue;
+        printError(
+            QString("--from-num and --to-num take a document number, not '%1'").arg(*number));
+        return 2;
+    }
+    if (!QFileInfo(company).isDir()) {
+        printError(QString("there is no company folder %1").arg(company));
+        return 1;
+    }
+
+    Context context;
+    startContext(context, common.settingId);
+    useCompanyFolder(context, company);
+    StoredValues stored(context.applicationName);
+    stored.choose(QStringLiteral("txtDBPath"), QDir(folder).absolutePath());
+    if (fromDate) stored.choose(QStringLiteral("txtFromDate"), *fromDate);
+    if (toDate) stored.choose(QStringLiteral("txtToDate"), *toDate);
+    if (fromNumber) stored.choose(QStringLiteral("txtFromDocNum"), fromNumber->trimmed());
+    if (toNumber) stored.choose(QStringLiteral("txtToDocNum"), toNumber->trimmed());
+    if (readItems) stored.choose(QStringLiteral("chkReadDocItems"), "1");
+    // The import button never reads the fast way; the flag asks for it.
+    stored.choose(QStringLiteral("chkUseFastWay"), fast ? "1" : "0");
+    if (fast) stored.choose(QStringLiteral("chkOnlyLine0"), "1");
+    if (stored.isChecked(QStringLiteral("chkReadDocItems"))) FillHostLists(stored, context);
+
+    TerminalProgress progress;
+    DocImportResult result;
+    const int status = runReporting([&] { result = runDocImport(stored, context, progress); });
+    if (status != 0) return status;
+    QTextStream out(stdout);
+    bool failed = result.stopped;
+    for (const DocTypeRead& read : result.types) {
+        out << describeRead(read) << '\n';
+        failed = failed || read.failure ||
+                 (stored.isChecked(QStringLiteral("chkReadDocItems")) &&
+                  read.scan.recordCount > 0 && !read.itemsImported);
+    }
+    if (result.stopped) {
+        printError("the document import stopped");
+        return 1;
+    }
+    out << progress.lastStep() << Qt::endl;
+    return failed ? 1 : 0;
 }
 
 }  // namespace etq::cli

@@ -77,6 +77,18 @@ int runImportItems(const QStringList& args);  // cli_import.cpp
 int runMarkItems(const QStringList& args);    // cli_print.cpp
 int runPrintItems(const QStringList& args);   // cli_print.cpp
 
+// The document road.
+int runImportDocs(const QStringList& args);  // cli_import.cpp
+int runPrintDocs(const QStringList& args);   // cli_print.cpp
+int runScanRanges(const QStringList& args);  // cli_docs.cpp, as the rest
+int runDocTypes(const QStringList& args);
+int runListDocs(const QStringList& args);
+int runIncludeDocs(const QStringList& args);
+int runExcludeDocs(const QStringList& args);
+int runIncludeLines(const QStringList& args);
+int runExcludeLines(const QStringList& args);
+int runSetCopies(const QStringList& args);
+
 namespace {
 
 const Command kCommands[] = {
@@ -96,6 +108,29 @@ const Command kCommands[] = {
      "mark items for printing and set their copies", runMarkItems},
     {"print-items", "--db DIR [--open]", "print the marked items' labels; prints the page's path",
      runPrintItems},
+    {"import-docs",
+     "--company DIR --db DIR [--from-date DD/MM/YYYY] [--to-date DD/MM/YYYY] [--from-num N] [--to-num N] [--read-items] [--fast]",
+     "read the host's stock documents of the types to scan into the working database",
+     runImportDocs},
+    {"doc-types", "--db DIR [--scan TYPES] [--no-scan TYPES] [--drafts TYPES] [--no-drafts TYPES]",
+     "show and choose the document types read, and their drafts (TYPES: 1,2,5 or all)",
+     runDocTypes},
+    {"scan-ranges", "--db DIR [--reset]",
+     "show where each document file's next scan starts; --reset starts them all anew",
+     runScanRanges},
+    {"list-docs", "--db DIR [--lines] [DOC...]",
+     "list the imported documents (DOC: file/number, as 1/101), with their lines", runListDocs},
+    {"include-docs", "--db DIR (--all | DOC...)", "choose documents for printing", runIncludeDocs},
+    {"exclude-docs", "--db DIR (--all | DOC...)", "leave documents out of printing",
+     runExcludeDocs},
+    {"include-lines", "--db DIR DOC (--all | LINE...)", "choose lines of a document for printing",
+     runIncludeLines},
+    {"exclude-lines", "--db DIR DOC (--all | LINE...)", "leave lines of a document out of printing",
+     runExcludeLines},
+    {"set-copies", "--db DIR DOC LINE COPIES", "set the label copies of a document line",
+     runSetCopies},
+    {"print-docs", "--db DIR [--open]",
+     "print the included document lines' labels; prints the page's path", runPrintDocs},
 };
 
 void printHelp() {

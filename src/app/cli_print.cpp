@@ -1,9 +1,10 @@
-// etiquon-cli mark-items and print-items: the item selection window and the item print button
-// without windows.
+// etiquon-cli mark-items, print-items and print-docs: the item selection window and the two
+// print buttons without windows.
 #include <QTextStream>
 
 #include "app/cli_command.h"
 #include "card/card_controller.h"
+#include "card/document_adapters.h"
 #include "card/print_adapters.h"
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/item_selection.h"
@@ -112,13 +113,17 @@ int runMarkItems(const QStringList& arguments) {
     return missing ? 1 : 0;
 }
 
-int runPrintItems(const QStringList& arguments) {
+namespace {
+
+// A print button's run: item labels, or document-line labels, which the fast way reads first.
+int runPrint(const QStringList& arguments, quint8 queryType) {
     QStringList args = arguments;
     const CommonOptions common = takeCommonOptions(args);
     const QString folder = takeOption(args, "--db");
     const bool open = takeFlag(args, "--open");
     if (folder.isEmpty() || !args.isEmpty()) {
-        printError("usage: etiquon-cli print-items --db DIR [--open] [--setting-id N]");
+        printError(QString("usage: etiquon-cli %1 --db DIR [--open] [--setting-id N]")
+                       .arg(queryType == ItemLabels ? "print-items" : "print-docs"));
         return 2;
     }
     CountingSink sink;
@@ -135,8 +140,11 @@ int runPrintItems(const QStringList& arguments) {
     NoProgress progress;
     BuiltInPrint print;
     const int status = runReporting([&] {
-        ItemPrintOptions options = readItemPrintOptions(stored);
-        print = printItemLabels(options, context, progress);
+        if (queryType == DocumentLineLabels && printsTheFastWay(stored) &&
+            runDocImport(stored, context, progress).stopped)
+            throw Failure(QStringLiteral("the document import stopped; nothing was printed"));
+        ItemPrintOptions options = readItemPrintOptions(stored, queryType);
+        print = printLabels(options, context, progress);
     });
     if (status != 0) return status;
     if (runReporting([&] { context.pages().showPage(print.pagePath); })) return 1;
@@ -145,6 +153,16 @@ int runPrintItems(const QStringList& arguments) {
                        .arg(print.refusedBarcodes.size())
                        .arg(print.refusedBarcodes.join(u'\n')));
     return sink.failures ? 1 : 0;
+}
+
+}  // namespace
+
+int runPrintItems(const QStringList& arguments) {
+    return runPrint(arguments, ItemLabels);
+}
+
+int runPrintDocs(const QStringList& arguments) {
+    return runPrint(arguments, DocumentLineLabels);
 }
 
 }  // namespace etq::cli

@@ -64,6 +64,8 @@ struct CommandTable {
             {u"LblToRef", &CardController::lblToRef},
             {u"Image3", &CardController::image3},
             {u"Image5", &CardController::image5},
+            {u"cmdImportDocs", &CardController::importDocs},
+            {u"Image6", &CardController::image6},
             {u"Image7", &CardController::image7},
             {u"Image8", &CardController::image8},
             {u"cmdAllDocTypes", &CardController::markAllDocTypes},
@@ -85,9 +87,9 @@ struct CommandTable {
 namespace {
 // Elements whose work another part provides.
 constexpr QStringView kWorkElements[] = {
-    u"cmdSelectItems",  u"cmdPrintItmes", u"cmdImportDocs", u"Image6",         u"cmdSelectDocItems",
-    u"cmdPrintDocButt", u"cmdRanges",     u"cmdDLog",       u"CmdImportItems", u"cmdAlterKeys",
-    u"cmdAccDef",       u"cmdEditItems",  u"cmdLabDesign",  u"CmdConnect",
+    u"cmdSelectItems", u"cmdPrintItmes", u"cmdSelectDocItems", u"cmdPrintDocButt",
+    u"cmdRanges",      u"cmdDLog",       u"CmdImportItems",    u"cmdAlterKeys",
+    u"cmdAccDef",      u"cmdEditItems",  u"cmdLabDesign",      u"CmdConnect",
 };
 }  // namespace
 
@@ -245,6 +247,26 @@ void CardController::lblToDate(int) {
 
 void CardController::lblToRef(int) {
     copyText(QStringLiteral("txtFromDocNum"), QStringLiteral("txtToDocNum"));
+}
+
+// The document import button starts with an empty progress bar and message line.
+void CardController::importDocs(int) {
+    surface_.control(QStringLiteral("ProgressFill")).setWidth(0);
+    surface_.control(QStringLiteral("Message1")).setCaption({});
+    importDocsAnew();
+}
+
+// Its picture leaves the bar as it was.
+void CardController::image6(int) {
+    surface_.control(QStringLiteral("cmdImportDocs")).setFocus();
+    importDocsAnew();
+}
+
+// A document import asked for by hand is never the fast way, which the print button's own
+// import is.
+void CardController::importDocsAnew() {
+    surface_.control(QStringLiteral("chkUseFastWay")).setValue(0);
+    if (hooks_.importDocs) hooks_.importDocs();
 }
 
 void CardController::image3(int) {

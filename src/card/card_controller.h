@@ -44,6 +44,8 @@ struct CardHooks {
     std::function<QStringList()> installedPrinters;
     // Starts a program with its arguments without waiting for it; false when it cannot start.
     std::function<bool(const QString& program, const QStringList& arguments)> startProgram;
+    // The document import run (ImportDocs) with the controls' values.
+    std::function<void()> importDocs;
 };
 
 // What the control does: start-up, the handling of every clickable element and of text and
@@ -96,6 +98,9 @@ class CardController {
     void lblToKey(int);
     void lblToDate(int);
     void lblToRef(int);
+    void importDocs(int);
+    void image6(int);
+    void importDocsAnew();
     void image3(int);
     void image5(int);
     void image7(int);

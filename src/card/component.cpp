@@ -4,6 +4,7 @@
 
 #include "card/boundary.h"
 #include "card/card_controller.h"
+#include "card/document_adapters.h"
 #include "card/import_adapters.h"
 #include "card/print_adapters.h"
 #include "db/local_databases.h"
@@ -34,6 +35,9 @@ void connectParts(CardController& controller, Surface& surface) {
                        [&surface, &context](int) { CmdImportItems(surface, context); });
     controller.setWork(QStringLiteral("cmdPrintItmes"),
                        [&surface, &context](int) { PrintItemLabels(surface, context); });
+    hooks.importDocs = [&surface, &context] { ImportDocs(surface, context); };
+    controller.setWork(QStringLiteral("cmdPrintDocButt"),
+                       [&surface, &context](int) { PrintDocLabels(surface, context); });
 }
 
 }  // namespace etq

@@ -15,22 +15,6 @@ namespace etq {
 
 namespace {
 
-// The copies every imported item gets: txtCopies as a 16-bit whole number.
-qint16 copiesOf(const ControlValues& values) {
-    const QString copies = values.text(QStringLiteral("txtCopies"));
-    if (const auto number = vb::toInteger(copies)) return *number;
-    jet::fail(jet::err::kTypeMismatch,
-              QStringLiteral("The copies \"%1\" are not a whole number from -32768 to 32767.")
-                  .arg(copies));
-}
-
-// The price entry that gives the items their price: the number behind the chosen price list.
-qint16 priceFieldOf(const ControlValues& values) {
-    if (const auto number = selectedNumber(values, QStringLiteral("cmbPriceField"))) return *number;
-    jet::fail(jet::err::kInvalidArgument,
-              QStringLiteral("No price list is chosen in cmbPriceField."));
-}
-
 // The three host lists of the reading-items tab, by combo box.
 struct ComboList {
     QStringView combo;
@@ -59,6 +43,20 @@ void fillCombo(const Surface& surface, Context& context, const QString& combo) {
 }
 
 }  // namespace
+
+qint16 copiesOf(const ControlValues& values) {
+    const QString copies = values.text(QStringLiteral("txtCopies"));
+    if (const auto number = vb::toInteger(copies)) return *number;
+    jet::fail(jet::err::kTypeMismatch,
+              QStringLiteral("The copies \"%1\" are not a whole number from -32768 to 32767.")
+                  .arg(copies));
+}
+
+qint16 priceFieldOf(const ControlValues& values) {
+    if (const auto number = selectedNumber(values, QStringLiteral("cmbPriceField"))) return *number;
+    jet::fail(jet::err::kInvalidArgument,
+              QStringLiteral("No price list is chosen in cmbPriceField."));
+}
 
 std::optional<qint16> selectedNumber(const ControlValues& values, const QString& combo) {
     const std::optional<int> data = values.selectedItemData(combo);
@@ -114,13 +112,22 @@ void CleanTables(const Surface& surface, Context& context, const QString& itemDb
 }
 
 bool ReadItemMNHL(const Surface& surface, Context& context, const QString& compPath,
-                  const QString& dbPath, const QVariant& /*fromItemKey*/,
+                  const QString& dbPath, const QVariant& fromItemKey, const QVariant& toItemKey,
+                  qint16 getForeign, qint16 copies, qint16 priceField, bool importPackUnits,
+                  bool byDocs, bool importPriceLists) {
+    SurfaceProgress progress(surface);
+    return ReadItemMNHL(SurfaceValues(surface), progress, context, compPath, dbPath, fromItemKey,
+                        toItemKey, getForeign, copies, priceField, importPackUnits, byDocs,
+                        importPriceLists);
+}
+
+bool ReadItemMNHL(const ControlValues& values, Progress& progress, Context& context,
+                  const QString& compPath, const QString& dbPath, const QVariant& /*fromItemKey*/,
                   const QVariant& /*toItemKey*/, qint16 getForeign, qint16 copies,
                   qint16 priceField, bool /*importPackUnits*/, bool /*byDocs*/,
                   bool importPriceLists) {
-    SurfaceProgress progress(surface);
     return reportFailures(context, context.caption(1), [&] {
-        ItemReadOptions options = readItemSelection(SurfaceValues(surface));
+        ItemReadOptions options = readItemSelection(values);
         options.companyFolder = compPath;
         options.databasePath = dbPath;
         options.foreignNames = getForeign != 0;

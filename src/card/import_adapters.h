@@ -14,12 +14,21 @@ namespace etq {
 
 class Context;
 class ControlValues;
+class Progress;
 class StoredValues;
 class Surface;
 
 // The item data of the combo's selected entry as a 16-bit number; nothing when none is chosen.
 // Throws JetError (overflow) for item data beyond 16 bits.
 std::optional<qint16> selectedNumber(const ControlValues& values, const QString& combo);
+
+// The copies every imported item gets: txtCopies as a 16-bit whole number. Throws JetError
+// (type mismatch) when it is none.
+qint16 copiesOf(const ControlValues& values);
+
+// The price entry that gives the items their price: the number behind the price list chosen in
+// cmbPriceField. Throws JetError when none is chosen.
+qint16 priceFieldOf(const ControlValues& values);
 
 // Which host items a reading takes: the key range txtFromItemKey..txtToItemKey, the item group
 // of cmbItmBelong when chkItmBelong is checked, and the query group rule of cmbItmQGrp and
@@ -48,6 +57,12 @@ bool ReadItemMNHL(const Surface& surface, Context& context, const QString& compP
                   const QString& dbPath, const QVariant& fromItemKey, const QVariant& toItemKey,
                   qint16 getForeign, qint16 copies, qint16 priceField, bool importPackUnits,
                   bool byDocs, bool importPriceLists);
+// The same reading on any control values (the command line's stored settings), its progress
+// shown on `progress`.
+bool ReadItemMNHL(const ControlValues& values, Progress& progress, Context& context,
+                  const QString& compPath, const QString& dbPath, const QVariant& fromItemKey,
+                  const QVariant& toItemKey, qint16 getForeign, qint16 copies, qint16 priceField,
+                  bool importPackUnits, bool byDocs, bool importPriceLists);
 bool ReadCoinsMNHL(const Surface& surface, Context& context, const QString& compPath,
                    const QString& dbPath);
 bool ReadSpecialPriceMNHL(const Surface& surface, Context& context, const QString& compPath,

@@ -18,7 +18,9 @@
 #include "card/card_controller.h"
 #include "card/component.h"
 #include "dialogs/bound_grid_model.h"
+#include "dialogs/edit_ranges_window.h"
 #include "dialogs/logon_dialog.h"
+#include "dialogs/select_doc_item_window.h"
 #include "dialogs/select_item_window.h"
 #include "platform/captions.h"
 #include "platform/context.h"
@@ -224,7 +226,23 @@ MainCard::MainCard(Context& context, QWidget* parent)
     });
     connectDocTypeGrid();
     connectItemSelection();
+    connectDocumentWindows();
     connectParts(*controller_, *this);
+}
+
+// cmdSelectDocItems opens the document line selection window, cmdRanges the scan range window,
+// each on the database folder the control took for its dialogs.
+void MainCard::connectDocumentWindows() {
+    controller_->setWork(QStringLiteral("cmdSelectDocItems"), [this](int) {
+        SelectDocItemWindow window(controller_->databaseFolder(), controller_->context().language,
+                                   this);
+        window.exec();
+    });
+    controller_->setWork(QStringLiteral("cmdRanges"), [this](int) {
+        EditRangesWindow window(controller_->databaseFolder(), controller_->context().language,
+                                this);
+        window.exec();
+    });
 }
 
 // cmdSelectItems opens the item selection window: the label tab's item range narrows the list,

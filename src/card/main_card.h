@@ -50,6 +50,7 @@ class MainCard : public QWidget, public Surface {
     void connectEvents(QWidget* widget, const QString& name, int index);
     void connectDocTypeGrid();
     void connectItemSelection();
+    void connectDocumentWindows();
 
     QTabWidget* mainTab_ = nullptr;
     std::vector<std::unique_ptr<WidgetControl>> controls_;

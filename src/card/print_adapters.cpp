@@ -64,13 +64,13 @@ LabelQueryInput readLabelQueryInput(const ControlValues& values, quint8 queryTyp
     return in;
 }
 
-ItemPrintOptions readItemPrintOptions(const ControlValues& values) {
+ItemPrintOptions readItemPrintOptions(const ControlValues& values, quint8 queryType) {
     ItemPrintOptions options;
     options.databaseFolder = values.text(QStringLiteral("txtDBPath"));
     options.kind = GetLabelSoftwareKind(values);
     if (values.listIndex(QStringLiteral("cmbPrinter")) >= 0)
         options.printer = values.text(QStringLiteral("cmbPrinter"));
-    options.page = readLabelPageInput(values, ItemLabels);
+    options.page = readLabelPageInput(values, queryType);
     return options;
 }
 
@@ -97,12 +97,16 @@ QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& db
 }
 
 QString PrintItemLabels(Surface& surface, Context& context) {
+    return PrintLabels(surface, context, ItemLabels);
+}
+
+QString PrintLabels(Surface& surface, Context& context, quint8 queryType) {
     QString workDb;
     if (!reportFailures(context, context.caption(1), [&] {
-            workDb = prepareItemPrint(readItemPrintOptions(SurfaceValues(surface)));
+            workDb = prepareItemPrint(readItemPrintOptions(SurfaceValues(surface), queryType));
         }))
         return {};
-    return PrintBuiltInLabels(surface, context, workDb, ItemLabels);
+    return PrintBuiltInLabels(surface, context, workDb, queryType);
 }
 
 void CreateLabFile(Surface& surface, Context& context, const QString& fileName,

@@ -28,9 +28,9 @@ quint8 labelOrder(const ControlValues& values);
 // field slots whose box ChkFldSend is checked and the company name.
 LabelQueryInput readLabelQueryInput(const ControlValues& values, quint8 queryType, quint8 order);
 
-// The item print's options: the database folder, the route, the printer chosen in cmbPrinter
-// and the label page's settings (item labels, in the printer type's order).
-ItemPrintOptions readItemPrintOptions(const ControlValues& values);
+// A print button's options: the database folder, the route, the printer chosen in cmbPrinter
+// and the label page's settings (item labels unless told, in the printer type's order).
+ItemPrintOptions readItemPrintOptions(const ControlValues& values, quint8 queryType = ItemLabels);
 
 // Ticks the boxes of the fields the query was given (the label page ticks those its cells show).
 void showFieldChecks(const Surface& surface, const LabelQueryInput& query);
@@ -45,6 +45,10 @@ QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& db
 // cmdPrintItmes: labels for the marked items on the chosen route. Returns the page's path, or
 // empty text when nothing was printed (the reason was shown).
 QString PrintItemLabels(Surface& surface, Context& context);
+
+// A print button's route for the labels of `queryType`: the steps before the labels, then the
+// built-in print. Returns as PrintItemLabels.
+QString PrintLabels(Surface& surface, Context& context, quint8 queryType);
 
 // The control's page writer: the label page `fileName` for the query of the label tab on the
 // database dbName, with the context's label definition. Ticks the boxes of the cells' fields.

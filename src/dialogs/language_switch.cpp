@@ -4,6 +4,7 @@
 #include <QAbstractItemView>
 #include <QComboBox>
 #include <QLabel>
+#include <QPushButton>
 
 namespace etq {
 
@@ -61,6 +62,14 @@ void FillComboFromList(QComboBox* combo, const QString& list) {
     combo->clear();
     combo->addItems(list.split(u';'));
     combo->setCurrentIndex(-1);
+}
+
+QPushButton* makeCaptionedButton(const QString& name, const QString& hebrew, const QString& english,
+                                 QWidget* parent) {
+    auto* button = new QPushButton(hebrew, parent);
+    button->setObjectName(name);
+    button->setProperty("Tag", english);
+    return button;
 }
 
 }  // namespace etq

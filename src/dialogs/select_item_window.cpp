@@ -49,10 +49,7 @@ constexpr int kRightCentred = 7;
 
 QPushButton* makeButton(QStringView name, QWidget* parent) {
     const Caption& c = captionOf(name);
-    auto* button = new QPushButton(c.hebrew.toString(), parent);
-    button->setObjectName(name.toString());
-    button->setProperty("Tag", c.english.toString());
-    return button;
+    return makeCaptionedButton(name.toString(), c.hebrew.toString(), c.english.toString(), parent);
 }
 
 QLineEdit* makeBox(const QString& name, QWidget* parent) {

@@ -100,6 +100,7 @@ bool scanType(const DocImportOptions& options, const QString& workDb, const jet:
     const bool drafts = isTrue(types.value(QStringLiteral("IncludeDraft")));
     DocTypeRead& read = result.types.emplace_back(
         readType(readerOptions(options, workDb, docTypeOf(types), drafts), context, progress));
+    if (read.failure && options.readerFailed) options.readerFailed(read.docType, read.failure);
     if (read.scan.recordCount == 0 || !options.readItems) return true;
     read.itemsImported = options.importItems();
     return read.itemsImported || continueAnyway(context);

@@ -16,8 +16,9 @@
 // later types unread and no final step.
 //
 // Failures: a failure of a document file's reader does not stop the run. A missing file gives 0
-// records without a word; any other failure is kept in the type's entry of the result for the
-// caller to report, the items step is skipped for that type and the run goes on with the next.
+// records without a word; any other failure is handed to readerFailed at once (so that the user
+// hears of it before the next type is read) and kept in the type's entry of the result, the
+// items step is skipped for that type and the run goes on with the next.
 // Any other failure throws (the engine's JetError, or QuietFailure when a database could not be
 // made: the routine that made it has told why) and ends the run, keeping what was written.
 
@@ -52,6 +53,8 @@ struct DocImportOptions {
     // The items step: imports the items of the scanned documents into the item database through
     // the temporary items database of the folder. False when it failed. Needed with readItems.
     std::function<bool()> importItems;
+    // Told of a reader's failure as soon as it happens, before the next type is read.
+    std::function<void(qint16 docType, const std::exception_ptr& failure)> readerFailed;
 };
 
 // What became of one document type the run read.

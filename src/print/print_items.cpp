@@ -13,6 +13,10 @@ namespace etq {
 QString prepareItemPrint(const ItemPrintOptions& options) {
     const QString& folder = options.databaseFolder;
     const QString workDb = db::inFolder(folder, db::kWorkDatabaseFile);
+    if (!QFileInfo::exists(workDb) && options.page.query.queryType != ItemLabels)
+        throw Failure(
+            QStringLiteral("%1 holds no imported documents (no %2): read the documents first")
+                .arg(folder, db::kWorkDatabaseFile));
     if (!QFileInfo::exists(workDb))
         db::CreateDocDatabase(db::inFolder(folder, db::kDocDatabaseFile),
                               db::inFolder(folder, db::kItemDatabaseFile), workDb, {});
@@ -26,8 +30,12 @@ QString prepareItemPrint(const ItemPrintOptions& options) {
 }
 
 BuiltInPrint printItemLabels(ItemPrintOptions& options, Context& context, Progress& progress) {
-    const QString workDb = prepareItemPrint(options);
     options.page.query.queryType = ItemLabels;
+    return printLabels(options, context, progress);
+}
+
+BuiltInPrint printLabels(ItemPrintOptions& options, Context& context, Progress& progress) {
+    const QString workDb = prepareItemPrint(options);
     return printBuiltInLabels(workDb, options.page, context.labelDefinition(), progress);
 }
 

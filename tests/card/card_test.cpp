@@ -345,12 +345,15 @@ TEST_F(CardTest, OtherElementsGoToTheirWork) {
         folderSeen = card.databaseFolder();
     });
     card.setWork("cmdPrintItmes", [&](int) { runs << "print"; });
+    card.setWork("cmdSelectDocItems", [&](int) { runs << "select lines"; });
+    card.setWork("cmdPrintDocButt", [&](int) { runs << "print lines"; });
     c("txtDBPath").setText("/data/etiquon");
 
     card.click("Image3");
     card.click("Image5");
-    card.click("cmdImportDocs");  // no work yet: nothing happens
-    EXPECT_EQ(runs, (QStringList{"select", "print"}));
+    card.click("Image7");
+    card.click("Image8");
+    EXPECT_EQ(runs, (QStringList{"select", "print", "select lines", "print lines"}));
     EXPECT_EQ(folderSeen, "/data/etiquon");
 
     EXPECT_TRUE(CardController::isClickable("LblToRef"));

@@ -127,20 +127,26 @@ TEST_F(DocumentImportTest, ItemsStepFailingAsksWhetherToContinue) {
     }
 }
 
-// A reader that fails is that type's failure: kept for the caller to report, the items step
-// skipped for it, and the run goes on with the next type.
+// A reader that fails is that type's failure: told to the caller before the next type is read,
+// kept in the result, the items step skipped for it, and the run goes on with the next type.
 TEST_F(DocumentImportTest, ReaderFailureIsKeptAndTheRunGoesOn) {
     prepareTypes();
     QFile dlvnote(company() + "/dlvnote.dbf");
     ASSERT_TRUE(dlvnote.resize(dlvnote.size() - 100));
     QList<int> itemSteps;
+    QStringList told;
     DocImportOptions o = runOptions();
     o.readItems = true;
     o.importItems = [&] {
         itemSteps << numbers().size();
         return true;
     };
+    o.readerFailed = [&](qint16 type, const std::exception_ptr& failure) {
+        told << QString("%1 after %2 headers").arg(type).arg(numbers().size());
+        EXPECT_THROW(std::rethrow_exception(failure), DbfError);
+    };
     const DocImportResult result = run(o);
+    EXPECT_EQ(told, QStringList{"1 after 0 headers"});
     EXPECT_EQ(typesRead(result), (QList<qint16>{1, 2, 4}));
     ASSERT_TRUE(result.types[0].failure);
     EXPECT_THROW(std::rethrow_exception(result.types[0].failure), DbfError);

@@ -157,5 +157,50 @@ TEST_F(DemoPageTest, Code128BitmapsReadBackAsTheItemKeys) {
     EXPECT_EQ(renderInChromium(lastLine(print.out)).labels, 24);
 }
 
+// The document road of the demo: one label per copy of every included line of an included
+// document whose item is known, in a thermal printer's order (document file, document and line
+// descending), each with the line's item barcode.
+TEST_F(DemoPageTest, BrowserShowsALabelPerCopyOfTheChosenDocumentLines) {
+    const ProcessResult demo = runProcess(
+        "bash", {etq::test::sourceDir() + "/tools/demo.sh", "--no-build", "--documents"}, env);
+    ASSERT_EQ(demo.exitCode, 0) << demo.err.toStdString();
+    const QString line = lastLine(demo.out);
+    ASSERT_TRUE(line.startsWith("The label page: ")) << line.toStdString();
+    const QString page = line.mid(int(sizeof("The label page: ")) - 1);
+
+    // Record by record, as the label query should give them: copies and barcode.
+    jet::Database workDb = jet::Database::open(work.path() + "/db/etiqondb.tmp");
+    QList<std::pair<int, QString>> records;
+    for (jet::Recordset rs = workDb.openRecordset(
+             "SELECT L.Copies, I.BarCode FROM tTempDocLines AS L, tTempDocHeaders AS H, tItems "
+             "AS I WHERE L.WizFileID = H.WizFileID AND L.HeadNumber = H.[Number] AND I.ItemKey = "
+             "L.ItemKey AND H.Include = True AND L.Include = True ORDER BY L.WizFileID DESC, "
+             "L.HeadNumber DESC, L.LineNum DESC");
+         !rs.eof(); rs.moveNext())
+        records.append({rs.value(0).toInt(), rs.value(1).toString()});
+    QStringList expectedImages;
+    for (int record = 1; record <= records.size(); ++record)
+        for (int copy = 0; copy < records[record - 1].first; ++copy)
+            expectedImages << QString("B04%1.BMP").arg(record, 5, 10, QChar('0'));
+    ASSERT_EQ(expectedImages.size(), 15);  // as the demo chooses them
+    EXPECT_EQ(records.last().first, 3);    // the first line of the first document, last
+
+    const Rendered rendered = renderInChromium(page);
+    EXPECT_EQ(rendered.labels, expectedImages.size());
+    QStringList images;
+    for (const auto& [source, width] : rendered.images) {
+        images << source;
+        EXPECT_GT(width, 0) << source.toStdString() << " did not load";
+    }
+    EXPECT_EQ(images, expectedImages);
+    const QString folder = QFileInfo(page).path();
+    for (int record = 1; record <= records.size(); ++record) {
+        if (records[record - 1].first == 0) continue;
+        EXPECT_EQ(decode(QString("%1/B04%2.BMP").arg(folder).arg(record, 5, 10, QChar('0'))),
+                  records[record - 1].second)
+            << record;
+    }
+}
+
 }  // namespace
 }  // namespace etq::print::test
