@@ -16,6 +16,7 @@
 #include "platform/printers.h"
 #include "platform/progress.h"
 #include "print/label_query.h"
+#include "print/print_engine.h"
 #include "surface/control_values.h"
 
 namespace etq::cli {
@@ -46,6 +47,19 @@ EntryList printerEntries() {
         qCInfo(log::card) << "no printer list:" << e.description();
     }
     return entries;
+}
+
+// The item print through label software: the engine on the stored settings.
+int printItemsWithLabelSoftware(const StoredValues& stored, const ItemPrintOptions& item,
+                                Context& context) {
+    NoProgress progress;
+    SystemPacing pacing;
+    return runReporting([&] {
+        printWithLabelSoftware(
+            readLabelSoftwareOptions(stored, stored.text(QStringLiteral("txtLabelName")),
+                                     ItemLabels, item.kind, prepareItemPrint(item), false),
+            context, progress, pacing);
+    });
 }
 
 int markUsage() {
@@ -132,12 +146,11 @@ int runPrintItems(const QStringList& arguments) {
     stored.choose(QStringLiteral("txtDBPath"), folder);
     loadStartUpLabelDefinition(stored, context);
 
+    ItemPrintOptions options = readItemPrintOptions(stored);
+    if (options.kind != kBuiltInPage) return printItemsWithLabelSoftware(stored, options, context);
     NoProgress progress;
     BuiltInPrint print;
-    const int status = runReporting([&] {
-        ItemPrintOptions options = readItemPrintOptions(stored);
-        print = printItemLabels(options, context, progress);
-    });
+    const int status = runReporting([&] { print = printItemLabels(options, context, progress); });
     if (status != 0) return status;
     if (runReporting([&] { context.pages().showPage(print.pagePath); })) return 1;
     if (!print.refusedBarcodes.isEmpty())

@@ -96,12 +96,47 @@ QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& db
     return print.pagePath;
 }
 
+LabelSoftwareOptions readLabelSoftwareOptions(const ControlValues& values, const QString& labelFile,
+                                              quint8 queryType, qint16 kind, const QString& workDb,
+                                              bool headLabels) {
+    LabelSoftwareOptions options;
+    options.workDatabase = workDb;
+    options.kind = kind;
+    options.labelFile = labelFile;
+    options.headLabels = headLabels;
+    if (headLabels) options.headLabelFile = values.text(QStringLiteral("txtLabelNameHead"));
+    options.query = readLabelQueryInput(values, queryType, labelOrder(values));
+    options.printDelay = values.text(QStringLiteral("txtPrintDelay"));
+    options.a4 = values.isChecked(QStringLiteral("OptPrinter"), 0);
+    options.priceFormat = values.text(QStringLiteral("txtPriceFormat"));
+    return options;
+}
+
+bool PrintWithLabelSoftware(Surface& surface, Context& context, const QString& labelFile,
+                            quint8 queryType, qint16 kind, const QString& workDb, bool headLabels) {
+    SurfaceProgress progress(surface);
+    SystemPacing pacing;
+    return reportFailures(context, context.caption(1), [&] {
+        printWithLabelSoftware(readLabelSoftwareOptions(SurfaceValues(surface), labelFile,
+                                                        queryType, kind, workDb, headLabels),
+                               context, progress, pacing);
+    });
+}
+
 QString PrintItemLabels(Surface& surface, Context& context) {
+    const SurfaceValues values(surface);
+    ItemPrintOptions options;
     QString workDb;
     if (!reportFailures(context, context.caption(1), [&] {
-            workDb = prepareItemPrint(readItemPrintOptions(SurfaceValues(surface)));
+            options = readItemPrintOptions(values);
+            workDb = prepareItemPrint(options);
         }))
         return {};
+    if (options.kind != kBuiltInPage) {
+        PrintWithLabelSoftware(surface, context, values.text(QStringLiteral("txtLabelName")),
+                               ItemLabels, options.kind, workDb, false);
+        return {};
+    }
     return PrintBuiltInLabels(surface, context, workDb, ItemLabels);
 }
 

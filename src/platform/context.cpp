@@ -1,5 +1,6 @@
 #include "platform/context.h"
 
+#include "platform/automation.h"
 #include "platform/browser.h"
 #include "platform/captions.h"
 #include "platform/messages.h"
@@ -29,6 +30,13 @@ void Context::setMessages(MessageSink* sink) {
 
 void Context::setPages(PageViewer* viewer) {
     pages_ = viewer ? viewer : defaultPages_.get();
+}
+
+AutomationRegistry& Context::automation() {
+    if (!automation_) {
+        automation_ = std::make_unique<AutomationRegistry>();
+    }
+    return *automation_;
 }
 
 QString Context::caption(int n) const {

@@ -14,6 +14,15 @@ inline constexpr qint16 kNiceLabel = 5;
 inline constexpr qint16 kBuiltInPage = 6;
 inline constexpr qint16 kFastLabel = 7;
 
+// The label software of a kind as the print engine drives it: the automation class it creates
+// and the program's name. Kinds without label software (none chosen, the built-in page) have
+// an empty class.
+struct LabelSoftware {
+    QString automationClass;
+    QString program;
+};
+LabelSoftware labelSoftwareOf(qint16 kind);
+
 // The file filters of a kind, as the component writes them ("Name|pattern|Name|pattern"):
 // for its label design files and for its program. Kinds without label software have none.
 QString labelFileFilter(qint16 kind);

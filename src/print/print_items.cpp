@@ -5,7 +5,6 @@
 #include "db/file_names.h"
 #include "db/local_databases.h"
 #include "platform/context.h"
-#include "platform/failure.h"
 #include "platform/printers.h"
 
 namespace etq {
@@ -16,12 +15,7 @@ QString prepareItemPrint(const ItemPrintOptions& options) {
     if (!QFileInfo::exists(workDb))
         db::CreateDocDatabase(db::inFolder(folder, db::kDocDatabaseFile),
                               db::inFolder(folder, db::kItemDatabaseFile), workDb, {});
-    if (options.kind != kBuiltInPage)
-        throw Failure(
-            QStringLiteral(
-                "No label software can be driven on this system (kind %1): choose \"Direct\" to print on the built-in label page")
-                .arg(options.kind));
-    if (options.printer) setDefaultPrinter(*options.printer);
+    if (options.kind == kBuiltInPage && options.printer) setDefaultPrinter(*options.printer);
     return workDb;
 }
 

@@ -22,8 +22,8 @@ struct ItemPrintOptions {
 };
 
 // The steps of the item print before the labels: makes the working database when it is
-// missing, refuses a route that cannot be driven here (only the built-in page can, yet) and
-// makes the chosen printer the default. Returns the working database's path. Throws.
+// missing and, for the built-in page, makes the chosen printer the default. Returns the working
+// database's path. Throws.
 QString prepareItemPrint(const ItemPrintOptions& options);
 
 // Labels for the marked items: prepareItemPrint, then the built-in print on the context's label
