@@ -93,7 +93,8 @@ const Command kCommands[] = {
      "read the host's items, prices and currencies into the item database", runImportItems},
     {"mark-items", "--db DIR (--all | --none | KEY...) [--copies N]",
      "mark items for printing and set their copies", runMarkItems},
-    {"print-items", "--db DIR [--open]", "print the marked items' labels; prints the page's path",
+    {"print-items", "--db DIR [--open] [--output FILE] [--printer NAME]",
+     "print the marked items' labels; prints the page's path (gLabels: the PDFs' paths)",
      runPrintItems},
 };
 

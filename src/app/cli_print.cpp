@@ -1,6 +1,8 @@
 // etiquon-cli mark-items and print-items: the item selection window and the item print button
 // without windows.
+#include <QFileInfo>
 #include <QTextStream>
+#include <optional>
 
 #include "app/cli_command.h"
 #include "card/card_controller.h"
@@ -8,9 +10,11 @@
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/item_selection.h"
 #include "jet/error.h"
+#include "platform/automation.h"
 #include "platform/browser.h"
 #include "platform/context.h"
 #include "platform/failure.h"
+#include "platform/glabels_automation.h"
 #include "platform/log.h"
 #include "platform/messages.h"
 #include "platform/printers.h"
@@ -49,17 +53,46 @@ EntryList printerEntries() {
     return entries;
 }
 
-// The item print through label software: the engine on the stored settings.
+// Where a print run's labels go, as the command line says: --output FILE keeps them in that
+// file and prints nothing; --printer NAME prints on that CUPS printer instead of the one the
+// settings choose. Every print route takes its destination from here.
+struct PrintDestination {
+    std::optional<QString> output;
+    std::optional<QString> printer;
+};
+
+PrintDestination takePrintDestination(QStringList& args) {
+    PrintDestination destination;
+    if (const QString output = takeOption(args, "--output"); !output.isEmpty())
+        destination.output = QFileInfo(output).absoluteFilePath();
+    if (const QString printer = takeOption(args, "--printer"); !printer.isEmpty())
+        destination.printer = printer;
+    return destination;
+}
+
+// The item print through label software: the engine on the stored settings. Prints the path of
+// every PDF gLabels made, then the output file when one was asked for.
 int printItemsWithLabelSoftware(const StoredValues& stored, const ItemPrintOptions& item,
-                                Context& context) {
+                                const PrintDestination& destination, Context& context) {
+    QStringList made;
+    context.automation().add(
+        std::make_shared<GLabelsProvider>([&made](const QString& pdf) { made << pdf; }));
     NoProgress progress;
     SystemPacing pacing;
-    return runReporting([&] {
-        printWithLabelSoftware(
+    const int status = runReporting([&] {
+        LabelSoftwareOptions options =
             readLabelSoftwareOptions(stored, stored.text(QStringLiteral("txtLabelName")),
-                                     ItemLabels, item.kind, prepareItemPrint(item), false),
-            context, progress, pacing);
+                                     ItemLabels, item.kind, prepareItemPrint(item), false);
+        if (destination.printer) options.printer = destination.printer;
+        if (destination.output) options.outputFile = *destination.output;
+        printWithLabelSoftware(options, context, progress, pacing);
     });
+    if (status != 0) return status;
+    QTextStream out(stdout);
+    for (const QString& pdf : made)
+        out << pdf << '\n';
+    if (destination.output) out << *destination.output << '\n';
+    return 0;
 }
 
 int markUsage() {
@@ -131,8 +164,10 @@ int runPrintItems(const QStringList& arguments) {
     const CommonOptions common = takeCommonOptions(args);
     const QString folder = takeOption(args, "--db");
     const bool open = takeFlag(args, "--open");
+    const PrintDestination destination = takePrintDestination(args);
     if (folder.isEmpty() || !args.isEmpty()) {
-        printError("usage: etiquon-cli print-items --db DIR [--open] [--setting-id N]");
+        printError(
+            "usage: etiquon-cli print-items --db DIR [--open] [--output FILE] [--printer NAME] [--setting-id N]");
         return 2;
     }
     CountingSink sink;
@@ -147,7 +182,12 @@ int runPrintItems(const QStringList& arguments) {
     loadStartUpLabelDefinition(stored, context);
 
     ItemPrintOptions options = readItemPrintOptions(stored);
-    if (options.kind != kBuiltInPage) return printItemsWithLabelSoftware(stored, options, context);
+    if (options.kind != kBuiltInPage)
+        return printItemsWithLabelSoftware(stored, options, destination, context);
+    if (destination.output || destination.printer) {
+        printError("--output and --printer take the gLabels route; the built-in page has none");
+        return 2;
+    }
     NoProgress progress;
     BuiltInPrint print;
     const int status = runReporting([&] { print = printItemLabels(options, context, progress); });

@@ -34,8 +34,8 @@ LabelPageInput readLabelPageInput(const ControlValues& values, quint8 queryType)
 }  // namespace
 
 qint16 GetLabelSoftwareKind(const ControlValues& values) {
-    constexpr qint16 kKindOfOption[] = {kNiceLabel, kCodeSoft, kBarTender, kBuiltInPage,
-                                        kFastLabel};
+    constexpr qint16 kKindOfOption[] = {kNiceLabel,   kCodeSoft,  kBarTender,
+                                        kBuiltInPage, kFastLabel, kGLabels};
     for (int option = 0; option < int(std::size(kKindOfOption)); ++option)
         if (values.value(QStringLiteral("OptOLE"), option) == 1) return kKindOfOption[option];
     return kNoLabelSoftware;
@@ -109,6 +109,8 @@ LabelSoftwareOptions readLabelSoftwareOptions(const ControlValues& values, const
     options.printDelay = values.text(QStringLiteral("txtPrintDelay"));
     options.a4 = values.isChecked(QStringLiteral("OptPrinter"), 0);
     options.priceFormat = values.text(QStringLiteral("txtPriceFormat"));
+    if (values.listIndex(QStringLiteral("cmbPrinter")) >= 0)
+        options.printer = values.text(QStringLiteral("cmbPrinter"));
     return options;
 }
 

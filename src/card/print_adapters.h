@@ -16,8 +16,8 @@ class ControlValues;
 class Surface;
 
 // The label software kind chosen with the option array OptOLE: 5 NiceLabel (option 0),
-// 2 CodeSoft (1), 4 BarTender (2), 6 the built-in label page (3), 7 FastLabel (4), 0 when no
-// option is selected.
+// 2 CodeSoft (1), 4 BarTender (2), 6 the built-in label page (3), 7 FastLabel (4), 8 gLabels
+// (5), 0 when no option is selected.
 qint16 GetLabelSoftwareKind(const ControlValues& values);
 qint16 GetLabelSoftwareKind(const Surface& surface);
 
@@ -46,7 +46,8 @@ QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& db
 // The print engine's options as the label tab and the general settings hold them: the print
 // delay txtPrintDelay, the printer type (OptPrinter: "Thermal" sorts descending, "A4" makes
 // NiceLabel print in sessions), the head label's design txtLabelNameHead when head labels are
-// on, the price format txtPriceFormat and the label query's settings. The caller gives the default design (txtLabelName), the query type, the kind and
+// on, the price format txtPriceFormat, the label query's settings and the printer chosen in
+// cmbPrinter. The caller gives the default design (txtLabelName), the query type, the kind and
 // the working database.
 LabelSoftwareOptions readLabelSoftwareOptions(const ControlValues& values, const QString& labelFile,
                                               quint8 queryType, qint16 kind, const QString& workDb,

@@ -3,6 +3,7 @@
 #include "platform/automation.h"
 #include "platform/browser.h"
 #include "platform/captions.h"
+#include "platform/glabels_automation.h"
 #include "platform/messages.h"
 #include "platform/settings_keys.h"
 
@@ -35,6 +36,7 @@ void Context::setPages(PageViewer* viewer) {
 AutomationRegistry& Context::automation() {
     if (!automation_) {
         automation_ = std::make_unique<AutomationRegistry>();
+        automation_->add(std::make_shared<GLabelsProvider>());
     }
     return *automation_;
 }

@@ -52,8 +52,8 @@ class Context {
     // The built-in label definition of this run, made empty on first use.
     LabelDefinition& labelDefinition();
 
-    // The automation classes this run can create: on first use, none (no label software can be
-    // driven on this system). A test or a command adds providers of its own here.
+    // The automation classes this run can create: on first use, the label software that can be
+    // driven on this system (gLabels). A test or a command adds providers of its own here.
     AutomationRegistry& automation();
 
     bool isEnglish() const { return language > 0; }

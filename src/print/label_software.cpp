@@ -3,6 +3,7 @@
 #include <QStringList>
 
 #include "platform/file_chooser.h"
+#include "platform/glabels_automation.h"
 
 namespace etq {
 
@@ -28,9 +29,12 @@ constexpr KindSoftware kKinds[] = {
     {kFastLabel, u"All Files (*.*)|*.*|FastLabel Files (*.lbl)|*.lbl",
      u"All Software (*.exe)|*.exe|FastLabel Software|fastlbl.exe", u"FastLabel.FastLabelX",
      u"FastLabel"},
+    // gLabels' program has no extension here; its designer is glabels-3.
+    {kGLabels, u"All Files (*.*)|*.*|gLabels Files (*.glabels)|*.glabels",
+     u"All Software (*.*)|*.*|gLabels Software|glabels-3", u"gLabels.Application", u"gLabels"},
 };
 
-const KindSoftware* filtersOf(qint16 kind) {
+const KindSoftware* softwareOf(qint16 kind) {
     for (const KindSoftware& f : kKinds)
         if (f.kind == kind) return &f;
     return nullptr;
@@ -46,18 +50,18 @@ QString choose(const QString& filter, FileChooser& chooser) {
 }  // namespace
 
 QString labelFileFilter(qint16 kind) {
-    const KindSoftware* f = filtersOf(kind);
+    const KindSoftware* f = softwareOf(kind);
     return f ? f->labelFiles.toString() : QString();
 }
 
 LabelSoftware labelSoftwareOf(qint16 kind) {
-    const KindSoftware* f = filtersOf(kind);
+    const KindSoftware* f = softwareOf(kind);
     return f ? LabelSoftware{f->automationClass.toString(), f->program.toString()}
              : LabelSoftware{};
 }
 
 QString labelSoftwareFilter(qint16 kind) {
-    const KindSoftware* f = filtersOf(kind);
+    const KindSoftware* f = softwareOf(kind);
     return f ? f->software.toString() : QString();
 }
 

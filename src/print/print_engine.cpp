@@ -202,6 +202,32 @@ class FastLabelDriver : public Driver {
     bool newBatch_ = true;
 };
 
+class GLabelsDriver : public Driver {
+  public:
+    GLabelsDriver(AutomationObject app, RunState& state, const LabelSoftwareOptions& options)
+        : Driver(std::move(app), state, true) {
+        if (options.printer) app_.set(QStringLiteral("Printer"), *options.printer);
+        if (!options.outputFile.isEmpty())
+            app_.set(QStringLiteral("OutputFile"), options.outputFile);
+    }
+
+    void open(const QString& file, bool) override { app_.call(QStringLiteral("Open"), {file}); }
+    void setVariable(const QString& name, const QVariant&, const QString& text) override {
+        app_.call(QStringLiteral("SetField"), {name, text});
+    }
+    void printRecord(const QVariant& copies) override {
+        mark(8);
+        app_.call(QStringLiteral("PrintRecord"), {vb::toLong(copies).value_or(0)});
+    }
+    void printHead() override { app_.call(QStringLiteral("PrintRecord"), {1}); }
+    void closeBeforeHead() override { app_.call(QStringLiteral("Close")); }
+    void closeBeforeRecord() override { closeBeforeHead(); }
+    void endOfRun() override {
+        app_.call(QStringLiteral("Close"));
+        app_.call(QStringLiteral("Quit"));
+    }
+};
+
 std::unique_ptr<Driver> createDriver(const LabelSoftwareOptions& options, RunState& state,
                                      const AutomationRegistry& registry) {
     const LabelSoftware software = labelSoftwareOf(options.kind);
@@ -218,8 +244,10 @@ std::unique_ptr<Driver> createDriver(const LabelSoftwareOptions& options, RunSta
             return std::make_unique<BarTenderDriver>(std::move(app), state);
         case kNiceLabel:
             return std::make_unique<NiceLabelDriver>(std::move(app), state, options.a4);
-        default:
+        case kFastLabel:
             return std::make_unique<FastLabelDriver>(std::move(app), state);
+        default:
+            return std::make_unique<GLabelsDriver>(std::move(app), state, options);
     }
 }
 

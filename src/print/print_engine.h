@@ -14,6 +14,7 @@
 
 #include <QString>
 #include <chrono>
+#include <optional>
 
 #include "print/label_query.h"
 
@@ -36,6 +37,10 @@ struct LabelSoftwareOptions {
     QString printDelay;
     bool a4 = false;      // "A4" printer type: NiceLabel prints in label sessions
     QString priceFormat;  // for values of price fields; blank: "0.00"
+    // Where gLabels puts its labels: the printer (lp's default when none) or, when outputFile is
+    // not empty, that PDF file and no printer.
+    std::optional<QString> printer;
+    QString outputFile;
 };
 
 // The time a run waits and lets the window breathe: the real clock in a run, a recording one in

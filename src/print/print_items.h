@@ -15,8 +15,8 @@ class Progress;
 struct ItemPrintOptions {
     QString databaseFolder;
     qint16 kind = kBuiltInPage;  // the label software kind of the chosen route
-    // The printer chosen for the built-in page; it becomes the user's default, which the
-    // browser prints to. Nothing chosen: the default stays.
+    // The printer chosen in the printer list. The built-in page makes it the user's default,
+    // which the browser prints to; gLabels prints on it. Nothing chosen: the default stays.
     std::optional<QString> printer;
     LabelPageInput page;  // its query's type is that of item labels
 };

@@ -142,6 +142,14 @@ TEST_F(PrintEngineTest, EachKindOpensFillsPrintsAndEndsWithItsOwnCalls) {
           R"(app.LabelSetVar("ItemKey", "A"))", R"(app.LabelSetVar("Price", "1.50"))", "yield",
           "app.LabelQty = 2", "app.AddRecord()", R"(app.LabelSetVar("ItemKey", "B"))",
           R"(app.LabelSetVar("Price", "2.00"))", "yield", "app.LabelQty = 3", "app.LabelPrint()"}},
+        {"gLabels",
+         kGLabels,
+         true,
+         {"new gLabels.Application", R"(app.Printer = "Zebra")", R"(app.Open("/l/item.lab"))",
+          R"(app.SetField("ItemKey", "A"))", R"(app.SetField("Price", "1.50"))", "yield",
+          "app.PrintRecord(2)", R"(app.SetField("ItemKey", "B"))",
+          R"(app.SetField("Price", "2.00"))", "yield", "app.PrintRecord(3)", "app.Close()",
+          "app.Quit()"}},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.name);
@@ -150,6 +158,7 @@ TEST_F(PrintEngineTest, EachKindOpensFillsPrintsAndEndsWithItsOwnCalls) {
         o.a4 = c.a4;
         o.query.order = c.a4 ? Ascending : Descending;
         o.query.fieldChecks[0] = o.query.fieldChecks[6] = true;
+        o.printer = "Zebra";
         EXPECT_EQ(run(o), "");
         EXPECT_EQ(software->calls, c.calls);
     }
