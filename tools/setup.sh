@@ -7,7 +7,7 @@ packages=(
     # build (Qt's CMake modules look for some of their parts with pkg-config)
     g++ cmake ninja-build pkg-config clang-format
     # libraries
-    qt6-base-dev libgl-dev libsqlite3-dev libzint-dev
+    qt6-base-dev libgl-dev libsqlite3-dev libzint-dev zlib1g-dev
     # tests and benchmarks: GoogleTest, and the independent tools the tests check against
     libgtest-dev sqlite3 zint zbar-tools python3 python3-dbfread
     # dBASE files as other tools write them, for the reader's tests
@@ -16,6 +16,9 @@ packages=(
     clang libclang-rt-14-dev llvm-14
     # desktop stand-ins: printers, Hebrew fonts, a display for screenshots, a browser
     cups-client culmus fonts-dejavu-core xvfb xauth chromium
+    # the gLabels route (glabels-3-batch; pdfunite joins its PDFs), and poppler's pdftoppm and
+    # pdftotext, with which its tests read the labels back
+    glabels poppler-utils
 )
 
 missing=()

@@ -1,6 +1,8 @@
 // etiquon-cli mark-items, print-items and print-docs: the item selection window and the two
 // print buttons without windows.
+#include <QFileInfo>
 #include <QTextStream>
+#include <optional>
 
 #include "app/cli_command.h"
 #include "card/card_controller.h"
@@ -9,14 +11,17 @@
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/item_selection.h"
 #include "jet/error.h"
+#include "platform/automation.h"
 #include "platform/browser.h"
 #include "platform/context.h"
 #include "platform/failure.h"
+#include "platform/glabels_automation.h"
 #include "platform/log.h"
 #include "platform/messages.h"
 #include "platform/printers.h"
 #include "platform/progress.h"
 #include "print/label_query.h"
+#include "print/print_engine.h"
 #include "surface/control_values.h"
 
 namespace etq::cli {
@@ -47,6 +52,52 @@ EntryList printerEntries() {
         qCInfo(log::card) << "no printer list:" << e.description();
     }
     return entries;
+}
+
+// Where a print run's labels go, as the command line says: --output FILE keeps them in that
+// file and prints nothing; --printer NAME prints on that CUPS printer instead of the one the
+// settings choose. Every print route takes its destination from here.
+struct PrintDestination {
+    std::optional<QString> output;
+    std::optional<QString> printer;
+};
+
+PrintDestination takePrintDestination(QStringList& args) {
+    PrintDestination destination;
+    if (const QString output = takeOption(args, "--output"); !output.isEmpty())
+        destination.output = QFileInfo(output).absoluteFilePath();
+    if (const QString printer = takeOption(args, "--printer"); !printer.isEmpty())
+        destination.printer = printer;
+    return destination;
+}
+
+// The item print through label software: the engine on the stored settings. Prints the path of
+// every PDF gLabels made, then the output file when one was asked for.
+int printWithLabelSoftwareRoute(const StoredValues& stored, const ItemPrintOptions& item,
+                                const PrintDestination& destination, Context& context) {
+    QStringList made;
+    context.automation().add(
+        std::make_shared<GLabelsProvider>([&made](const QString& pdf) { made << pdf; }));
+    NoProgress progress;
+    SystemPacing pacing;
+    const int status = runReporting([&] {
+        const quint8 queryType = item.page.query.queryType;
+        // Document lines may have a head label per document, on a design of its own.
+        const bool headLabels = queryType == DocumentLineLabels &&
+                                stored.isChecked(QStringLiteral("chkPrintHeadLabel"));
+        LabelSoftwareOptions options =
+            readLabelSoftwareOptions(stored, stored.text(QStringLiteral("txtLabelName")), queryType,
+                                     item.kind, prepareItemPrint(item), headLabels);
+        if (destination.printer) options.printer = destination.printer;
+        if (destination.output) options.outputFile = *destination.output;
+        printWithLabelSoftware(options, context, progress, pacing);
+    });
+    if (status != 0) return status;
+    QTextStream out(stdout);
+    for (const QString& pdf : made)
+        out << pdf << '\n';
+    if (destination.output) out << *destination.output << '\n';
+    return 0;
 }
 
 int markUsage() {
@@ -121,9 +172,12 @@ int runPrint(const QStringList& arguments, quint8 queryType) {
     const CommonOptions common = takeCommonOptions(args);
     const QString folder = takeOption(args, "--db");
     const bool open = takeFlag(args, "--open");
+    const PrintDestination destination = takePrintDestination(args);
     if (folder.isEmpty() || !args.isEmpty()) {
-        printError(QString("usage: etiquon-cli %1 --db DIR [--open] [--setting-id N]")
-                       .arg(queryType == ItemLabels ? "print-items" : "print-docs"));
+        printError(
+            QString(
+                "usage: etiquon-cli %1 --db DIR [--open] [--output FILE] [--printer NAME] [--setting-id N]")
+                .arg(queryType == ItemLabels ? "print-items" : "print-docs"));
         return 2;
     }
     CountingSink sink;
@@ -138,14 +192,22 @@ int runPrint(const QStringList& arguments, quint8 queryType) {
     loadStartUpLabelDefinition(stored, context);
 
     NoProgress progress;
+    // The fast way reads the documents first, as the button does.
+    if (queryType == DocumentLineLabels && printsTheFastWay(stored) && runReporting([&] {
+            if (runDocImport(stored, context, progress).stopped)
+                throw Failure(QStringLiteral("the document import stopped; nothing was printed"));
+        }))
+        return 1;
+    ItemPrintOptions options;
+    if (runReporting([&] { options = readItemPrintOptions(stored, queryType); })) return 1;
+    if (options.kind != kBuiltInPage)
+        return printWithLabelSoftwareRoute(stored, options, destination, context);
+    if (destination.output || destination.printer) {
+        printError("--output and --printer take the gLabels route; the built-in page has none");
+        return 2;
+    }
     BuiltInPrint print;
-    const int status = runReporting([&] {
-        if (queryType == DocumentLineLabels && printsTheFastWay(stored) &&
-            runDocImport(stored, context, progress).stopped)
-            throw Failure(QStringLiteral("the document import stopped; nothing was printed"));
-        ItemPrintOptions options = readItemPrintOptions(stored, queryType);
-        print = printLabels(options, context, progress);
-    });
+    const int status = runReporting([&] { print = printLabels(options, context, progress); });
     if (status != 0) return status;
     if (runReporting([&] { context.pages().showPage(print.pagePath); })) return 1;
     if (!print.refusedBarcodes.isEmpty())

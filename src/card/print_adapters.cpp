@@ -34,8 +34,8 @@ LabelPageInput readLabelPageInput(const ControlValues& values, quint8 queryType)
 }  // namespace
 
 qint16 GetLabelSoftwareKind(const ControlValues& values) {
-    constexpr qint16 kKindOfOption[] = {kNiceLabel, kCodeSoft, kBarTender, kBuiltInPage,
-                                        kFastLabel};
+    constexpr qint16 kKindOfOption[] = {kNiceLabel,   kCodeSoft,  kBarTender,
+                                        kBuiltInPage, kFastLabel, kGLabels};
     for (int option = 0; option < int(std::size(kKindOfOption)); ++option)
         if (values.value(QStringLiteral("OptOLE"), option) == 1) return kKindOfOption[option];
     return kNoLabelSoftware;
@@ -96,16 +96,56 @@ QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& db
     return print.pagePath;
 }
 
+LabelSoftwareOptions readLabelSoftwareOptions(const ControlValues& values, const QString& labelFile,
+                                              quint8 queryType, qint16 kind, const QString& workDb,
+                                              bool headLabels) {
+    LabelSoftwareOptions options;
+    options.workDatabase = workDb;
+    options.kind = kind;
+    options.labelFile = labelFile;
+    options.headLabels = headLabels;
+    if (headLabels) options.headLabelFile = values.text(QStringLiteral("txtLabelNameHead"));
+    options.query = readLabelQueryInput(values, queryType, labelOrder(values));
+    options.printDelay = values.text(QStringLiteral("txtPrintDelay"));
+    options.a4 = values.isChecked(QStringLiteral("OptPrinter"), 0);
+    options.priceFormat = values.text(QStringLiteral("txtPriceFormat"));
+    if (values.listIndex(QStringLiteral("cmbPrinter")) >= 0)
+        options.printer = values.text(QStringLiteral("cmbPrinter"));
+    return options;
+}
+
+bool PrintWithLabelSoftware(Surface& surface, Context& context, const QString& labelFile,
+                            quint8 queryType, qint16 kind, const QString& workDb, bool headLabels) {
+    SurfaceProgress progress(surface);
+    SystemPacing pacing;
+    return reportFailures(context, context.caption(1), [&] {
+        printWithLabelSoftware(readLabelSoftwareOptions(SurfaceValues(surface), labelFile,
+                                                        queryType, kind, workDb, headLabels),
+                               context, progress, pacing);
+    });
+}
+
 QString PrintItemLabels(Surface& surface, Context& context) {
     return PrintLabels(surface, context, ItemLabels);
 }
 
 QString PrintLabels(Surface& surface, Context& context, quint8 queryType) {
+    const SurfaceValues values(surface);
+    ItemPrintOptions options;
     QString workDb;
     if (!reportFailures(context, context.caption(1), [&] {
-            workDb = prepareItemPrint(readItemPrintOptions(SurfaceValues(surface), queryType));
+            options = readItemPrintOptions(values, queryType);
+            workDb = prepareItemPrint(options);
         }))
         return {};
+    if (options.kind != kBuiltInPage) {
+        // Document lines may have a head label per document, on a design of its own.
+        const bool headLabels = queryType == DocumentLineLabels &&
+                                values.isChecked(QStringLiteral("chkPrintHeadLabel"));
+        PrintWithLabelSoftware(surface, context, values.text(QStringLiteral("txtLabelName")),
+                               queryType, options.kind, workDb, headLabels);
+        return {};
+    }
     return PrintBuiltInLabels(surface, context, workDb, queryType);
 }
 

@@ -6,6 +6,7 @@
 
 #include <QString>
 
+#include "print/print_engine.h"
 #include "print/print_items.h"
 
 namespace etq {
@@ -15,8 +16,8 @@ class ControlValues;
 class Surface;
 
 // The label software kind chosen with the option array OptOLE: 5 NiceLabel (option 0),
-// 2 CodeSoft (1), 4 BarTender (2), 6 the built-in label page (3), 7 FastLabel (4), 0 when no
-// option is selected.
+// 2 CodeSoft (1), 4 BarTender (2), 6 the built-in label page (3), 7 FastLabel (4), 8 gLabels
+// (5), 0 when no option is selected.
 qint16 GetLabelSoftwareKind(const ControlValues& values);
 qint16 GetLabelSoftwareKind(const Surface& surface);
 
@@ -42,8 +43,28 @@ void showFieldChecks(const Surface& surface, const LabelQueryInput& query);
 QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& dbName,
                            quint8 queryType);
 
-// cmdPrintItmes: labels for the marked items on the chosen route. Returns the page's path, or
-// empty text when nothing was printed (the reason was shown).
+// The print engine's options as the label tab and the general settings hold them: the print
+// delay txtPrintDelay, the printer type (OptPrinter: "Thermal" sorts descending, "A4" makes
+// NiceLabel print in sessions), the head label's design txtLabelNameHead when head labels are
+// on, the price format txtPriceFormat, the label query's settings and the printer chosen in
+// cmbPrinter. The caller gives the default design (txtLabelName), the query type, the kind and
+// the working database.
+LabelSoftwareOptions readLabelSoftwareOptions(const ControlValues& values, const QString& labelFile,
+                                              quint8 queryType, qint16 kind, const QString& workDb,
+                                              bool headLabels);
+
+// The print engine on the label tab's settings, its progress on the surface: labels of the
+// query type (item labels, or the chosen document lines with head labels when headLabels is
+// set) through the kind's label software, from the default design labelFile, on the working
+// database workDb. A failure is shown with caption 1 as title and the engine's message. True
+// when the run reached its end. The document print calls it with DocumentLineLabels,
+// txtLabelName, and head labels when chkPrintHeadLabel is checked.
+bool PrintWithLabelSoftware(Surface& surface, Context& context, const QString& labelFile,
+                            quint8 queryType, qint16 kind, const QString& workDb, bool headLabels);
+
+// cmdPrintItmes: labels for the marked items on the chosen route, the built-in page or the print
+// engine with txtLabelName. Returns the page's path, or empty text when no page was made (label
+// software prints without one; a failure was shown).
 QString PrintItemLabels(Surface& surface, Context& context);
 
 // A print button's route for the labels of `queryType`: the steps before the labels, then the

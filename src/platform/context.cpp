@@ -1,7 +1,9 @@
 #include "platform/context.h"
 
+#include "platform/automation.h"
 #include "platform/browser.h"
 #include "platform/captions.h"
+#include "platform/glabels_automation.h"
 #include "platform/messages.h"
 #include "platform/settings_keys.h"
 
@@ -29,6 +31,14 @@ void Context::setMessages(MessageSink* sink) {
 
 void Context::setPages(PageViewer* viewer) {
     pages_ = viewer ? viewer : defaultPages_.get();
+}
+
+AutomationRegistry& Context::automation() {
+    if (!automation_) {
+        automation_ = std::make_unique<AutomationRegistry>();
+        automation_->add(std::make_shared<GLabelsProvider>());
+    }
+    return *automation_;
 }
 
 QString Context::caption(int n) const {

@@ -5,6 +5,7 @@
 
 namespace etq {
 
+class AutomationRegistry;
 class MessageSink;
 class PageViewer;
 struct LabelDefinition;
@@ -51,6 +52,10 @@ class Context {
     // The built-in label definition of this run, made empty on first use.
     LabelDefinition& labelDefinition();
 
+    // The automation classes this run can create: on first use, the label software that can be
+    // driven on this system (gLabels). A test or a command adds providers of its own here.
+    AutomationRegistry& automation();
+
     bool isEnglish() const { return language > 0; }
     // Caption n of the caption table in this context's language.
     QString caption(int n) const;
@@ -61,6 +66,7 @@ class Context {
     MessageSink* messages_;
     PageViewer* pages_;
     std::shared_ptr<LabelDefinition> labelDefinition_;
+    std::unique_ptr<AutomationRegistry> automation_;
 };
 
 }  // namespace etq

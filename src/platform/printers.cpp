@@ -12,22 +12,27 @@ constexpr int kWaitMs = 10000;
 
 // Runs a CUPS client program and gives its standard output; throws Failure with the reason.
 QByteArray runCups(const QString& program, const QStringList& args) {
+    return runPrintTool(program, args, kWaitMs).out;
+}
+
+}  // namespace
+
+ToolOutput runPrintTool(const QString& program, const QStringList& args, int timeoutMs) {
     QProcess process;
     process.start(program, args);
-    if (!process.waitForStarted(kWaitMs))
+    if (!process.waitForStarted(timeoutMs))
         throw Failure(QStringLiteral("cannot run %1: %2").arg(program, process.errorString()));
-    if (!process.waitForFinished(kWaitMs)) {
+    if (!process.waitForFinished(timeoutMs)) {
         process.kill();
         process.waitForFinished();
         throw Failure(QStringLiteral("%1 did not answer").arg(program));
     }
+    ToolOutput output{process.readAllStandardOutput(), process.readAllStandardError()};
     if (process.exitStatus() != QProcess::NormalExit || process.exitCode() != 0)
-        throw Failure(QStringLiteral("%1: %2").arg(
-            program, QString::fromLocal8Bit(process.readAllStandardError()).trimmed()));
-    return process.readAllStandardOutput();
+        throw Failure(
+            QStringLiteral("%1: %2").arg(program, QString::fromLocal8Bit(output.err).trimmed()));
+    return output;
 }
-
-}  // namespace
 
 QStringList installedPrinters() {
     const QByteArray output = runCups(QStringLiteral("lpstat"), {QStringLiteral("-e")});
@@ -41,6 +46,12 @@ QStringList installedPrinters() {
 
 void setDefaultPrinter(const QString& name) {
     runCups(QStringLiteral("lpoptions"), {QStringLiteral("-d"), name});
+}
+
+void sendToPrinter(const QString& file, const std::optional<QString>& printer) {
+    QStringList args;
+    if (printer) args << QStringLiteral("-d") << *printer;
+    runCups(QStringLiteral("lp"), args << file);
 }
 
 }  // namespace etq

@@ -16,6 +16,7 @@ constexpr SettingKey kKeys[] = {
     {1, u"GeneralParams", u"OptOLE2", u"OptOLE", 2, false, T::Value, u"False"},
     {1, u"GeneralParams", u"OptOLE3", u"OptOLE", 3, false, T::Value, u"True"},
     {1, u"GeneralParams", u"OptOLE4", u"OptOLE", 4, false, T::Value, u"False"},
+    {1, u"GeneralParams", u"OptOLE5", u"OptOLE", 5, false, T::Value, u"False"},
     {1, u"GeneralParams", u"LabelName", u"txtLabelName", -1, false, T::Text, u"",
      PathDefault::HomeLabelFile},
     {1, u"GeneralParams", u"DBPath", u"txtDBPath", -1, false, T::Text, u"",

@@ -3,30 +3,39 @@
 #include <QStringList>
 
 #include "platform/file_chooser.h"
+#include "platform/glabels_automation.h"
 
 namespace etq {
 
 namespace {
 
-struct KindFilters {
+struct KindSoftware {
     qint16 kind;
     QStringView labelFiles;
     QStringView software;
+    QStringView automationClass;
+    QStringView program;
 };
 
-constexpr KindFilters kFilters[] = {
+constexpr KindSoftware kKinds[] = {
     {kCodeSoft, u"All Files (*.*)|*.*|CodeSoft Files (*.lab)|*.lab",
-     u"All Software (*.exe)|*.exe|CodeSoft Software|Lppa.exe"},
+     u"All Software (*.exe)|*.exe|CodeSoft Software|Lppa.exe", u"LPPX.Application", u"CodeSoft"},
     {kBarTender, u"All Files (*.*)|*.*|BarTender Files (*.btw)|*.btw",
-     u"All Software (*.exe)|*.exe|BarTender Software|Bartend.exe"},
+     u"All Software (*.exe)|*.exe|BarTender Software|Bartend.exe", u"BarTender.Application",
+     u"BarTender"},
     {kNiceLabel, u"All Files (*.*)|*.*|NiceLabel Files (*.lbl)|*.lbl",
-     u"All Software (*.exe)|*.exe|NiceLabel Software|Nice3.exe"},
+     u"All Software (*.exe)|*.exe|NiceLabel Software|Nice3.exe", u"NiceLabel.Application",
+     u"NiceLabel"},
     {kFastLabel, u"All Files (*.*)|*.*|FastLabel Files (*.lbl)|*.lbl",
-     u"All Software (*.exe)|*.exe|FastLabel Software|fastlbl.exe"},
+     u"All Software (*.exe)|*.exe|FastLabel Software|fastlbl.exe", u"FastLabel.FastLabelX",
+     u"FastLabel"},
+    // gLabels' program has no extension here; its designer is glabels-3.
+    {kGLabels, u"All Files (*.*)|*.*|gLabels Files (*.glabels)|*.glabels",
+     u"All Software (*.*)|*.*|gLabels Software|glabels-3", u"gLabels.Application", u"gLabels"},
 };
 
-const KindFilters* filtersOf(qint16 kind) {
-    for (const KindFilters& f : kFilters)
+const KindSoftware* softwareOf(qint16 kind) {
+    for (const KindSoftware& f : kKinds)
         if (f.kind == kind) return &f;
     return nullptr;
 }
@@ -41,12 +50,18 @@ QString choose(const QString& filter, FileChooser& chooser) {
 }  // namespace
 
 QString labelFileFilter(qint16 kind) {
-    const KindFilters* f = filtersOf(kind);
+    const KindSoftware* f = softwareOf(kind);
     return f ? f->labelFiles.toString() : QString();
 }
 
+LabelSoftware labelSoftwareOf(qint16 kind) {
+    const KindSoftware* f = softwareOf(kind);
+    return f ? LabelSoftware{f->automationClass.toString(), f->program.toString()}
+             : LabelSoftware{};
+}
+
 QString labelSoftwareFilter(qint16 kind) {
-    const KindFilters* f = filtersOf(kind);
+    const KindSoftware* f = softwareOf(kind);
     return f ? f->software.toString() : QString();
 }
 

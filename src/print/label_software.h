@@ -13,6 +13,17 @@ inline constexpr qint16 kBarTender = 4;
 inline constexpr qint16 kNiceLabel = 5;
 inline constexpr qint16 kBuiltInPage = 6;
 inline constexpr qint16 kFastLabel = 7;
+// gLabels: designs merged and printed by glabels-3-batch, driven like the others.
+inline constexpr qint16 kGLabels = 8;
+
+// The label software of a kind as the print engine drives it: the automation class it creates
+// and the program's name. Kinds without label software (none chosen, the built-in page) have
+// an empty class.
+struct LabelSoftware {
+    QString automationClass;
+    QString program;
+};
+LabelSoftware labelSoftwareOf(qint16 kind);
 
 // The file filters of a kind, as the component writes them ("Name|pattern|Name|pattern"):
 // for its label design files and for its program. Kinds without label software have none.

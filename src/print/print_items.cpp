@@ -20,12 +20,7 @@ QString prepareItemPrint(const ItemPrintOptions& options) {
     if (!QFileInfo::exists(workDb))
         db::CreateDocDatabase(db::inFolder(folder, db::kDocDatabaseFile),
                               db::inFolder(folder, db::kItemDatabaseFile), workDb, {});
-    if (options.kind != kBuiltInPage)
-        throw Failure(
-            QStringLiteral(
-                "No label software can be driven on this system (kind %1): choose \"Direct\" to print on the built-in label page")
-                .arg(options.kind));
-    if (options.printer) setDefaultPrinter(*options.printer);
+    if (options.kind == kBuiltInPage && options.printer) setDefaultPrinter(*options.printer);
     return workDb;
 }
 

@@ -16,17 +16,16 @@ class Progress;
 struct ItemPrintOptions {
     QString databaseFolder;
     qint16 kind = kBuiltInPage;  // the label software kind of the chosen route
-    // The printer chosen for the built-in page; it becomes the user's default, which the
-    // browser prints to. Nothing chosen: the default stays.
+    // The printer chosen in the printer list. The built-in page makes it the user's default,
+    // which the browser prints to; gLabels prints on it. Nothing chosen: the default stays.
     std::optional<QString> printer;
     LabelPageInput page;  // its query's type says which labels
 };
 
 // The steps of a print before the labels: makes the working database when it is missing
 // (item labels; document-line labels need the one a document import made, and a Failure says
-// so when there is none), refuses a route that cannot be driven here (only the built-in page
-// can, yet) and makes the chosen printer the default. Returns the working database's path.
-// Throws.
+// so when there is none) and, for the built-in page, makes the chosen printer the default.
+// Returns the working database's path. Throws.
 QString prepareItemPrint(const ItemPrintOptions& options);
 
 // Labels for the marked items: prepareItemPrint, then the built-in print on the context's label

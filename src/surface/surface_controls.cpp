@@ -111,6 +111,7 @@ constexpr ControlSpec kControls[] = {
     {u"OptOLE", 2, K::OptionButton, 4, u"DDEorOLE", u"BarTender", u"BarTender", u"", 0, 2},
     {u"OptOLE", 3, K::OptionButton, 4, u"DDEorOLE", u"Direct", u"Direct", u"", 0, 3},
     {u"OptOLE", 4, K::OptionButton, 4, u"DDEorOLE", u"FastLabel", u"FastLabel", u"", 0, 4},
+    {u"OptOLE", 5, K::OptionButton, 4, u"DDEorOLE", u"gLabels", u"gLabels", u"", 0, 5},
     {u"PrinterType", -1, K::Frame, 4, u"", u"סוג המדפסת", u"Printer type", u"", 3, 0, 1, 2},
     {u"OptPrinter", 0, K::OptionButton, 4, u"PrinterType", u"A4", u"A4", u"", 0, 0},
     {u"OptPrinter", 1, K::OptionButton, 4, u"PrinterType", u"Thermal", u"Thermal", u"", 0, 1},

@@ -269,12 +269,12 @@ TEST_F(CardTest, OpeningTheLabelSoftwareNeedsTheProgram) {
 }
 
 TEST_F(CardTest, TheSelectedOptionGivesTheLabelSoftwareKind) {
-    const qint16 kinds[] = {5, 2, 4, 6, 7};
-    for (int i = 0; i < 5; ++i) {
+    const qint16 kinds[] = {5, 2, 4, 6, 7, 8};
+    for (int i = 0; i < 6; ++i) {
         c("OptOLE", i).setValue(true);
         EXPECT_EQ(GetLabelSoftwareKind(surface), kinds[i]) << "OptOLE(" << i << ")";
     }
-    c("OptOLE", 4).setValue(false);
+    c("OptOLE", 5).setValue(false);
     EXPECT_EQ(GetLabelSoftwareKind(surface), 0);
 }
 
@@ -303,6 +303,7 @@ TEST_F(CardTest, FileChoosersOfferTheKindsFiles) {
     card.click("CmdDir", 1);
     EXPECT_EQ(chooser.filters.last(), "");
     EXPECT_EQ(toQtFilter(labelFileFilter(7)), "All Files (*);;FastLabel Files (*.lbl)");
+    EXPECT_EQ(toQtFilter(labelFileFilter(8)), "All Files (*);;gLabels Files (*.glabels)");
     EXPECT_EQ(toQtFilter(labelSoftwareFilter(4)),
               "All Software (*.exe);;BarTender Software (Bartend.exe)");
 }

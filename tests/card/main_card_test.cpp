@@ -37,7 +37,7 @@ const struct {
      "txtFromItemKey txtToItemKey chkItmQGrp cmbItmQGrp cmbItmQGrpBy chkItmBelong cmbItmBelong chkReadPriceList ChkClean ChkImportAlterPrices txtCopies cmbPriceField CmbItemNameType CmdImportItems cmdSaveDef2"},
     {3, "cmbPrinter cmdAlterKeys cmdAccDef cmdEditItems"},
     {4,
-     "txtCompanyName txtDBPath DDEorOLE OptOLE(0) OptOLE(1) OptOLE(2) OptOLE(3) OptOLE(4) PrinterType OptPrinter(0) OptPrinter(1) txtLabelSoftware CmdDir(2) txtLabelName CmdDir(1) ImgEdit(1) txtLabelNameHead CmdDir(0) ImgEdit(0) cmdLabDesign CmdConnect cmdSaveDef1"},
+     "txtCompanyName txtDBPath DDEorOLE OptOLE(0) OptOLE(1) OptOLE(2) OptOLE(3) OptOLE(4) OptOLE(5) PrinterType OptPrinter(0) OptPrinter(1) txtLabelSoftware CmdDir(2) txtLabelName CmdDir(1) ImgEdit(1) txtLabelNameHead CmdDir(0) ImgEdit(0) cmdLabDesign CmdConnect cmdSaveDef1"},
     {5, "txtPrintDelay txtPriceFormat CmdSaveFields"},
     {6,
      "VSDocTypes cmdAllDocTypes cmdNoDocTypes cmbAddressFrom cmbAddressSeperator cmbCopiesAt cmbLine0From txtLine0Copies chkUseDeliverLog cmdSaveDef6"},
@@ -91,7 +91,7 @@ TEST_F(MainCardTest, EveryControlIsOnItsTabInBothSurfaces) {
     EXPECT_EQ(card.mainTab()->count(), 8);
     EXPECT_EQ(card.elementCount("ChkFldSend"), 41);
     EXPECT_EQ(memory.elementCount("ChkFldSend"), 41);
-    EXPECT_EQ(card.elementCount("OptOLE"), 5);
+    EXPECT_EQ(card.elementCount("OptOLE"), 6);
     EXPECT_EQ(card.elementCount("txtDBPath"), 0);
 }
 

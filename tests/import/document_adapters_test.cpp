@@ -241,14 +241,14 @@ TEST_F(DocumentAdaptersTest, PrintButtonPrintsTheIncludedLinesCopies) {
     ASSERT_EQ(viewer.shown.size(), 2);
     EXPECT_EQ(labelsOnPage(), 3);
 
-    c("OptOLE", 1).setValue(true);  // label software: not on this system yet
+    c("OptOLE", 1).setValue(true);  // CodeSoft: a Windows program, not on this system
     controller.click("cmdPrintDocButt");
     QFile::remove(path(db::kWorkDatabaseFile));
     c("OptOLE", 3).setValue(true);
     controller.click("cmdPrintDocButt");
     EXPECT_EQ(viewer.shown.size(), 2);
     ASSERT_EQ(critical().size(), 2);
-    EXPECT_TRUE(critical()[0].contains("Direct"));
+    EXPECT_TRUE(critical()[0].contains("not available here"));
     EXPECT_TRUE(critical()[1].contains("etiqondb.tmp"));
     EXPECT_FALSE(QFile::exists(path(db::kWorkDatabaseFile)));
 }

@@ -90,12 +90,13 @@ TEST_F(CliPrintTest, PrintItemsEndsWithThePagePath) {
     EXPECT_EQ(file.readAll().count("<td class='L0'>"), 2);
 }
 
-TEST_F(CliPrintTest, PrintItemsWithLabelSoftwareChosenFails) {
+TEST_F(CliPrintTest, PrintItemsWithWindowsLabelSoftwareChosenFails) {
     ASSERT_EQ(cli5({"config", "set", "GeneralParams", "OptOLE3", "False"}).exitCode, 0);
     ASSERT_EQ(cli5({"config", "set", "GeneralParams", "OptOLE0", "True"}).exitCode, 0);
     const ProcessResult r = cli5({"print-items", "--db", db()});
     EXPECT_EQ(r.exitCode, 1);
-    EXPECT_TRUE(r.err.contains("\"Direct\"")) << r.err.toStdString();
+    EXPECT_TRUE(r.err.contains("NiceLabel is not available here")) << r.err.toStdString();
+    EXPECT_TRUE(r.err.contains(" In Line 2, LabelID = 0")) << r.err.toStdString();
     EXPECT_EQ(cli5({"print-items"}).exitCode, 2);
 }
 

@@ -7,6 +7,7 @@
 #include "card/card_controller.h"
 #include "card/component.h"
 #include "print_fixture.h"
+#include "recording_automation.h"
 
 namespace etq::print::test {
 namespace {
@@ -82,12 +83,52 @@ TEST_F(PrintButtonTest, ChosenPrinterBecomesTheDefaultBeforePrinting) {
     EXPECT_TRUE(messages.shown[0].text.contains("Unknown printer"));
 }
 
-TEST_F(PrintButtonTest, LabelSoftwareChosenIsReportedWithoutPrinting) {
+// With label software chosen the button runs the print engine on the label tab's settings; a
+// program this system does not have is reported with the engine's message, titled "Error".
+TEST_F(PrintButtonTest, LabelSoftwareChosenPrintsThroughTheEngine) {
+    addItems({{"A", "סבון", {}, 1.25, 2}});
     surface.control("OptOLE", 2).setValue(true);
     controller.click("cmdPrintItmes");
     EXPECT_TRUE(viewer.shown.isEmpty());
     ASSERT_EQ(messages.shown.size(), 1);
     EXPECT_EQ(messages.shown[0].icon, MsgIcon::Critical);
+    EXPECT_EQ(messages.shown[0].title, context.caption(1));
+    EXPECT_EQ(
+        messages.shown[0].text,
+        "BarTender is not available here: no program on this system provides the automation class \"BarTender.Application\" In Line 2, LabelID = 0, Var = , Value = ");
+
+    auto software = std::make_shared<RecordingAutomation>();
+    context.automation().add(software);
+    surface.control("OptOLE", 0).setValue(true);  // NiceLabel
+    surface.control("txtLabelName").setText("/l/item.lbl");
+    surface.control("txtPriceFormat").setText("0.0");
+    surface.control("ChkFldSend", 6).setValue(1);
+    controller.click("cmdPrintItmes");
+    EXPECT_EQ(messages.shown.size(), 1);
+    EXPECT_EQ(software->calls,
+              (QStringList{"new NiceLabel.Application", R"(app.LabelOpen("/l/item.lbl"))",
+                           "app.LabelSessionStart(7)",
+                           R"(app.LabelSetVar(7, "Price", "1.3", -9999, -9999))",
+                           R"(app.LabelSessionPrint(7, "2,0"))", "app.LabelSessionEnd(7)",
+                           "app.LabelClose(7)", "app.Quit()"}));
+    EXPECT_EQ(surface.control("Message1").caption(), context.caption(44));
+    EXPECT_EQ(surface.control("ProgressFill").width(), surface.control("ProgressFrame").width());
+
+    // The document print's route: head labels from txtLabelNameHead, "Thermal" order.
+    jet::Database work = jet::Database::open(workDb());
+    work.execute("INSERT INTO tTempDocHeaders (WizFileID, Number, Include) VALUES (1, 10, True)");
+    work.execute(
+        "INSERT INTO tTempDocLines (WizFileID, HeadNumber, LineNum, ItemKey, Copies, Include) VALUES (1, 10, 1, 'A', 1, True), (1, 10, 2, 'A', 4, True)");
+    software->calls.clear();
+    surface.control("txtLabelNameHead").setText("/l/head.lbl");
+    surface.control("OptPrinter", 1).setValue(true);
+    surface.control("ChkFldSend", 6).setValue(0);
+    EXPECT_TRUE(PrintWithLabelSoftware(surface, context, "/l/line.lbl", DocumentLineLabels,
+                                       kNiceLabel, workDb(), true));
+    EXPECT_EQ(software->callsWith({"Open", "Print("}),
+              (QStringList{R"(app.LabelOpen("/l/head.lbl"))", R"(app.LabelPrint(7, "1,0"))",
+                           R"(app.LabelOpen("/l/line.lbl"))", R"(app.LabelPrint(7, "4,0"))",
+                           R"(app.LabelPrint(7, "1,0"))"}));
 }
 
 }  // namespace

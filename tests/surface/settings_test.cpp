@@ -66,7 +66,7 @@ TEST_F(SettingsTest, AnEmptyStoreGivesTheDefaults) {
     loadAll(surface);
 
     EXPECT_EQ(text("txtCompanyName"), "Corvan Information Systems");
-    for (int i = 0; i < 5; ++i)
+    for (int i = 0; i < 6; ++i)
         EXPECT_EQ(surface.control("OptOLE", i).value().toBool(), i == 3) << "OptOLE(" << i << ")";
     EXPECT_FALSE(surface.control("OptPrinter", 0).value().toBool());
     EXPECT_TRUE(surface.control("OptPrinter", 1).value().toBool());  // "Thermal"
