@@ -15,7 +15,10 @@
 #include "platform/messages.h"
 #include "platform/printers.h"
 #include "platform/progress.h"
+#include "print/label_definition.h"
+#include "print/label_pdf.h"
 #include "print/label_query.h"
+#include "print/label_software.h"
 #include "surface/control_values.h"
 
 namespace etq::cli {
@@ -48,6 +51,25 @@ EntryList printerEntries() {
     return entries;
 }
 
+// The built-in labels' PDF: where the command line sends it, or else the direct print of the
+// settings; nothing for the browser page. The printer chosen in the settings gives the paper
+// also when the PDF is only written.
+std::optional<PdfDestination> pdfDestinationOf(const PrintDestination& given,
+                                               const ControlValues& stored, bool outlines) {
+    std::optional<PdfDestination> destination = readPdfDestination(stored);
+    if (given.given()) {
+        destination = PdfDestination{};
+        destination->file = given.output;
+        destination->send = given.printer.has_value();
+        destination->printer =
+            given.printer.value_or(stored.listIndex(QStringLiteral("cmbPrinter")) >= 0
+                                       ? stored.text(QStringLiteral("cmbPrinter"))
+                                       : QString());
+    }
+    if (destination) destination->outlines = outlines;
+    return destination;
+}
+
 int markUsage() {
     printError(
         "usage: etiquon-cli mark-items --db DIR (--all | --none | KEY...) [--copies N] [--setting-id N]");
@@ -55,6 +77,19 @@ int markUsage() {
 }
 
 }  // namespace
+
+PrintDestination takePrintDestination(QStringList& args) {
+    // Given as "--name VALUE" or "--name=VALUE"; an empty value is kept, for the usage to refuse.
+    auto take = [&args](const QString& name) -> std::optional<QString> {
+        for (const QString& arg : args)
+            if (arg == name || arg.startsWith(name + u'=')) return takeOption(args, name);
+        return std::nullopt;
+    };
+    PrintDestination destination;
+    destination.output = take(QStringLiteral("--output"));
+    destination.printer = take(QStringLiteral("--printer"));
+    return destination;
+}
 
 int runMarkItems(const QStringList& arguments) {
     QStringList args = arguments;
@@ -115,10 +150,14 @@ int runMarkItems(const QStringList& arguments) {
 int runPrintItems(const QStringList& arguments) {
     QStringList args = arguments;
     const CommonOptions common = takeCommonOptions(args);
+    const PrintDestination destination = takePrintDestination(args);
     const QString folder = takeOption(args, "--db");
     const bool open = takeFlag(args, "--open");
-    if (folder.isEmpty() || !args.isEmpty()) {
-        printError("usage: etiquon-cli print-items --db DIR [--open] [--setting-id N]");
+    const bool outlines = takeFlag(args, "--outlines");
+    if (folder.isEmpty() || !args.isEmpty() || destination.output == QString() ||
+        destination.printer == QString()) {
+        printError(
+            "usage: etiquon-cli print-items --db DIR [--open] [--output FILE] [--printer NAME] [--outlines] [--setting-id N]");
         return 2;
     }
     CountingSink sink;
@@ -133,11 +172,31 @@ int runPrintItems(const QStringList& arguments) {
     loadStartUpLabelDefinition(stored, context);
 
     NoProgress progress;
+    ItemPrintOptions options = readItemPrintOptions(stored);
+    const std::optional<PdfDestination> pdf = pdfDestinationOf(destination, stored, outlines);
+    if (pdf && options.kind == kBuiltInPage) {
+        options.printer.reset();  // the job names its printer; the user's default stays
+        PdfLabels labels;
+        const int status = runReporting([&] {
+            const QString workDb = prepareItemPrint(options);
+            options.page.query.queryType = ItemLabels;
+            labels = printLabelsPdf(workDb, options.page, loadedLabelDefinition(context), *pdf,
+                                    progress);
+        });
+        if (status != 0) return status;
+        if (!labels.refusedBarcodes.isEmpty())
+            printError(QStringLiteral("%1 labels have no barcode:\n%2")
+                           .arg(labels.refusedBarcodes.size())
+                           .arg(labels.refusedBarcodes.join(u'\n')));
+        QTextStream(stdout) << labels.labels << " labels on " << labels.pages << " pages"
+                            << (pdf->send && labels.labels > 0 ? " sent to the printer" : "")
+                            << "\n"
+                            << labels.path << Qt::endl;
+        return sink.failures ? 1 : 0;
+    }
+
     BuiltInPrint print;
-    const int status = runReporting([&] {
-        ItemPrintOptions options = readItemPrintOptions(stored);
-        print = printItemLabels(options, context, progress);
-    });
+    const int status = runReporting([&] { print = printItemLabels(options, context, progress); });
     if (status != 0) return status;
     if (runReporting([&] { context.pages().showPage(print.pagePath); })) return 1;
     if (!print.refusedBarcodes.isEmpty())

@@ -7,6 +7,7 @@
 #include "platform/context.h"
 #include "platform/failure.h"
 #include "platform/printers.h"
+#include "print/label_definition.h"
 
 namespace etq {
 
@@ -28,7 +29,7 @@ QString prepareItemPrint(const ItemPrintOptions& options) {
 BuiltInPrint printItemLabels(ItemPrintOptions& options, Context& context, Progress& progress) {
     const QString workDb = prepareItemPrint(options);
     options.page.query.queryType = ItemLabels;
-    return printBuiltInLabels(workDb, options.page, context.labelDefinition(), progress);
+    return printBuiltInLabels(workDb, options.page, loadedLabelDefinition(context), progress);
 }
 
 }  // namespace etq
