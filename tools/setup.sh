@@ -16,6 +16,8 @@ packages=(
     clang libclang-rt-14-dev llvm-14
     # desktop stand-ins: printers, Hebrew fonts, a display for screenshots, a browser
     cups-client culmus fonts-dejavu-core xvfb xauth chromium
+    # label sheet products (gLabels' catalogue), and the PDF tools the tests read PDFs with
+    glabels-data poppler-utils
 )
 
 missing=()

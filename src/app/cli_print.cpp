@@ -188,7 +188,8 @@ int runPrintItems(const QStringList& arguments) {
             printError(QStringLiteral("%1 labels have no barcode:\n%2")
                            .arg(labels.refusedBarcodes.size())
                            .arg(labels.refusedBarcodes.join(u'\n')));
-        QTextStream(stdout) << labels.labels << " labels on " << labels.pages << " pages"
+        QTextStream(stdout) << labels.labels << " labels on " << labels.pages
+                            << (labels.pages == 1 ? " page" : " pages")
                             << (pdf->send && labels.labels > 0 ? " sent to the printer" : "")
                             << "\n"
                             << labels.path << Qt::endl;
