@@ -3,7 +3,9 @@
 # folder, import the company's items, mark a dozen of them with two copies each, and print their
 # labels on the built-in label page. The last line names the page; on a desktop it opens in the
 # browser.
-#   tools/demo.sh [--no-build] [--screenshot FILE]
+#   tools/demo.sh [--no-build] [--screenshot FILE] [--pdf-picture FILE]
+# --pdf-picture also draws the labels as a PDF without a browser (<work>/labels.pdf) and turns
+# its page into a picture.
 # The demo keeps its settings under SettingID 90 (~/.config/Etiquon/Etiquon90.ini) and its files
 # in <build>/demo (or $ETIQUON_DEMO_DIR); the page lies in the user's private print folder.
 set -euo pipefail
@@ -11,12 +13,14 @@ cd "$(dirname "$0")/.."
 build="${ETIQUON_BUILD_DIR:-build}"
 work="${ETIQUON_DEMO_DIR:-$build/demo}"
 screenshot=""
+pdf_picture=""
 no_build=""
 while [ $# -gt 0 ]; do
     case "$1" in
         --no-build) no_build=1 ;;
         --screenshot) screenshot="$2"; shift ;;
-        *) echo "usage: tools/demo.sh [--no-build] [--screenshot FILE]" >&2; exit 2 ;;
+        --pdf-picture) pdf_picture="$2"; shift ;;
+        *) echo "usage: tools/demo.sh [--no-build] [--screenshot FILE] [--pdf-picture FILE]" >&2; exit 2 ;;
     esac
     shift
 done
@@ -61,5 +65,10 @@ if [ -n "$screenshot" ]; then
         --screenshot="$(realpath -m "$screenshot")" "file://$page" 2>/dev/null
     rm -rf "$profile"
     echo "screenshot: $screenshot"
+fi
+if [ -n "$pdf_picture" ]; then
+    "$cli" "${demo[@]}" print-items --db "$work/db" --output "$work/labels.pdf" >/dev/null
+    pdftoppm -r 70 -png -singlefile "$work/labels.pdf" "${pdf_picture%.png}"
+    echo "PDF: $work/labels.pdf, its page: $pdf_picture"
 fi
 echo "The label page: $page"

@@ -18,6 +18,8 @@
 #include "support/qt_print.h"
 #include "support/test_env.h"
 
+#include "demo_fixture.h"
+
 namespace etq::print::test {
 namespace {
 
@@ -25,10 +27,6 @@ using etq::test::ProcessResult;
 using etq::test::runProcess;
 
 constexpr double kPt = 25.4 / 72;
-
-QString lastLine(const QString& text) {
-    return text.trimmed().split(u'\n').last().trimmed();
-}
 
 // A page rendered by pdftoppm as an 8-bit grey image.
 struct Render {
@@ -112,33 +110,19 @@ PdfInfo pdfInfo(const QString& pdf) {
     return info;
 }
 
-QString decode(const QString& image) {
-    return runProcess("zbarimg", {"-q", "--raw", image}).out.trimmed();
-}
-
-class PdfPrintTest : public ::testing::Test {
+class PdfPrintTest : public DemoTest {
   protected:
     void SetUp() override {
-        env = QProcessEnvironment::systemEnvironment();
-        env.remove("DISPLAY");
-        env.remove("WAYLAND_DISPLAY");
-        env.insert("ETIQUON_BUILD_DIR", ETIQUON_BUILD_DIR);
-        env.insert("ETIQUON_DEMO_DIR", work.path());
-        const ProcessResult demo =
-            runProcess("bash", {etq::test::sourceDir() + "/tools/demo.sh", "--no-build"}, env);
+        DemoTest::SetUp();
+        const ProcessResult demo = runDemo();
         ASSERT_EQ(demo.exitCode, 0) << demo.err.toStdString();
-        jet::Database items = jet::Database::open(work.path() + "/db/etqnitm.kdb");
-        jet::Recordset rs = items.openRecordset(
-            "SELECT BarCode, ItemName, Copies FROM tItems WHERE PrintLabel = True ORDER BY ItemKey");
-        for (; !rs.eof(); rs.moveNext())
-            for (int copy = 0; copy < rs.value(2).toInt(); ++copy) {
-                barcodes << rs.value(0).toString();
-                names << rs.value(1).toString();
+        const QStringList barcode = marked("BarCode"), name = marked("ItemName");
+        const QStringList copies = marked("Copies");
+        for (qsizetype item = 0; item < barcode.size(); ++item)
+            for (int copy = 0; copy < copies[item].toInt(); ++copy) {
+                barcodes << barcode[item];
+                names << name[item];
             }
-    }
-    ProcessResult cli(const QStringList& args) {
-        return runProcess(QString(ETIQUON_BUILD_DIR) + "/src/app/etiquon-cli",
-                          QStringList{"--setting-id", "90"} + args, env);
     }
     ProcessResult printPdf(const QStringList& args) {
         return cli(QStringList{"print-items", "--db", work.path() + "/db"} + args);
@@ -151,8 +135,6 @@ class PdfPrintTest : public ::testing::Test {
         return read;
     }
 
-    QTemporaryDir work;
-    QProcessEnvironment env;
     QStringList barcodes;  // label by label, in item order, each copy
     QStringList names;
 };
