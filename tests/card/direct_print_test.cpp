@@ -64,6 +64,16 @@ TEST_F(DirectPrintTest, TheLabelsPdfGoesToTheChosenPrinterOnItsPaper) {
     EXPECT_TRUE(pdf.startsWith("%PDF-"));
     EXPECT_TRUE(pdf.contains("/MediaBox [0 0 419.527559 595.275591]"));
 
+    // A sheet product this machine's catalogue lacks prints nothing rather than misplace the
+    // labels on the sheet.
+    def.page.SheetBrand = "Nobody";
+    def.page.SheetPart = "0";
+    controller.click("cmdPrintItmes");
+    ASSERT_EQ(messages.shown.size(), 1);
+    EXPECT_EQ(messages.shown[0].title, "תקלה");
+    EXPECT_TRUE(messages.shown[0].text.contains("Nobody 0 is not in the catalogue"));
+    EXPECT_EQ(read("log").count("lp -d"), 1);  // the first print's only
+
     surface.control("cmbPrintMode").setListIndex(0);  // the browser page again
     controller.click("cmdPrintItmes");
     EXPECT_EQ(viewer.shown.size(), 1);

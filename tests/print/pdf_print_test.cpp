@@ -218,8 +218,8 @@ TEST_F(PdfPrintTest, LabelsLieWhereTheSheetProductHasThem) {
 }
 
 // --printer sends the PDF with lp to that printer, on its paper (a stand-in CUPS with A5 as its
-// default); --output and --printer together send the file written; an option without its value
-// is refused.
+// default); --output and --printer together send the file written; direct print chosen in the
+// settings sends it without either; an option without its value is refused.
 TEST_F(PdfPrintTest, ThePrinterOptionSendsThePdfWithLp) {
     QTemporaryDir cups;
     auto script = [&](const QString& name, const QByteArray& body) {
@@ -251,6 +251,14 @@ TEST_F(PdfPrintTest, ThePrinterOptionSendsThePdfWithLp) {
     ASSERT_EQ(calls.size(), 2);
     EXPECT_EQ(calls[0], "-d Zebra_GK420 -- " + lastLine(r.out));
     EXPECT_EQ(calls[1], "-d Zebra_GK420 -- " + pdf);
+
+    // Direct print chosen in the settings, no printer chosen: the default printer prints.
+    ASSERT_EQ(cli({"config", "set", "GeneralParams", "PrintMode", "1"}).exitCode, 0);
+    r = printPdf({});
+    ASSERT_EQ(r.exitCode, 0) << r.err.toStdString();
+    log.seek(0);
+    EXPECT_EQ(QString::fromUtf8(log.readAll()).trimmed().split('\n').value(2),
+              "-- " + lastLine(r.out));
 
     EXPECT_EQ(printPdf({"--output"}).exitCode, 2);
     EXPECT_EQ(printPdf({"--printer="}).exitCode, 2);
