@@ -57,23 +57,23 @@ constexpr DesignerControl kSharedControls[] = {
     {u"txtLabBottom", K::TextBox, &DirectLabelDef::LabBottom, u"תחתונים:", u"Bottom:"},
 };
 
-// The part of the definition a member belongs to.
-template <class T>
-LabelCell& partOf(LabelDefinition& def, int cell, T LabelCell::*) {
+// The part of the definition a member belongs to (const when the definition is).
+template <class Def, class T>
+auto& partOf(Def& def, int cell, T LabelCell::*) {
     return def.cells[size_t(cell)];
 }
-template <class T>
-LabelBarDef& partOf(LabelDefinition& def, int, T LabelBarDef::*) {
+template <class Def, class T>
+auto& partOf(Def& def, int, T LabelBarDef::*) {
     return def.bar;
 }
-template <class T>
-DirectLabelDef& partOf(LabelDefinition& def, int, T DirectLabelDef::*) {
+template <class Def, class T>
+auto& partOf(Def& def, int, T DirectLabelDef::*) {
     return def.page;
 }
 
 // Calls `work` with a reference to the control's field.
-template <class Work>
-auto withField(const DesignerControl& control, LabelDefinition& def, int cell, Work&& work) {
+template <class Def, class Work>
+auto withField(const DesignerControl& control, Def& def, int cell, Work&& work) {
     return std::visit([&](auto member) { return work(partOf(def, cell, member).*member); },
                       control.field);
 }
@@ -134,13 +134,11 @@ const DesignerControl* findDesignerControl(QStringView name) {
 }
 
 int designerValue(const DesignerControl& control, const LabelDefinition& def, int cell) {
-    auto& mutableDef = const_cast<LabelDefinition&>(def);
-    return withField(control, mutableDef, cell, [](auto& field) { return numberOf(field); });
+    return withField(control, def, cell, [](const auto& field) { return numberOf(field); });
 }
 
 QString designerText(const DesignerControl& control, const LabelDefinition& def, int cell) {
-    auto& mutableDef = const_cast<LabelDefinition&>(def);
-    return withField(control, mutableDef, cell, [](auto& field) {
+    return withField(control, def, cell, [](const auto& field) {
         if constexpr (std::is_same_v<std::decay_t<decltype(field)>, QString>)
             return field;
         else
@@ -166,8 +164,8 @@ bool setDesignerText(const DesignerControl& control, LabelDefinition& def, int c
 
 QString designerValueProblem(const DesignerControl& control, int cell, const QString& text,
                              qint16 language) {
-    LabelDefinition scratch;
-    const QString what = withField(control, scratch, 0, [&](auto& field) {
+    const LabelDefinition scratch;
+    const QString what = withField(control, scratch, 0, [&](const auto& field) {
         using T = std::decay_t<decltype(field)>;
         if constexpr (std::is_arithmetic_v<T> && !std::is_same_v<T, bool>)
             return expected<T>(language);

@@ -407,8 +407,7 @@ QString LabelDesignerWindow::GetSetFormLabDefs(quint8 action, LabelDefinition& d
     const Quiet quiet(quiet_);
     QString problem;
     auto move = [&](const DesignerControl& binding, int cell) {
-        const int index = cell;
-        QWidget* widget = control(binding.name, index);
+        QWidget* widget = control(binding.name, cell);
         if (!GetSetFormLabDef(action, widget, binding, def, std::max(cell, 0)) && problem.isEmpty())
             problem = designerValueProblem(binding, cell, static_cast<QLineEdit*>(widget)->text(),
                                            context_.language);
