@@ -27,7 +27,9 @@ TEST(SheetLengthTest, EveryUnitOfTheCatalogueBecomesMillimetres) {
     for (const auto& c : cases) {
         const std::optional<double> mm = sheetLength(QString(c.text));
         ASSERT_EQ(mm.has_value(), c.mm.has_value()) << c.text;
-        if (mm) EXPECT_NEAR(*mm, *c.mm, 1e-9) << c.text;
+        if (mm) {
+            EXPECT_NEAR(*mm, *c.mm, 1e-9) << c.text;
+        }
     }
 }
 
