@@ -11,6 +11,7 @@
 #include <QTemporaryDir>
 #include <QTextStream>
 #include <algorithm>
+#include <memory>
 
 #include "db/file_names.h"
 #include "db/local_databases.h"
@@ -23,50 +24,14 @@
 #include "print/label_page.h"
 #include "print/label_query.h"
 
+#include "bench_labels.h"
+
 using namespace etq;
 
 namespace {
 
-// A valid EAN-13 with the Israeli prefix.
-QString ean13(int n) {
-    const QString digits = QStringLiteral("729") + QString::number(n).rightJustified(9, u'0');
-    int sum = 0;
-    for (int i = 0; i < 12; ++i)
-        sum += digits[i].digitValue() * (i % 2 ? 3 : 1);
-    return digits + QString::number((10 - sum % 10) % 10);
-}
-
-double median(QList<double> values) {
-    std::sort(values.begin(), values.end());
-    return values[values.size() / 2];
-}
-
-QString prepareFolder(const QString& folder, int labels) {
-    const QString docDb = db::inFolder(folder, db::kDocDatabaseFile);
-    const QString itemDb = db::inFolder(folder, db::kItemDatabaseFile);
-    const QString workDb = db::inFolder(folder, db::kWorkDatabaseFile);
-    QFile::copy(ETIQUON_DELIVERED_KDB, docDb);
-    QFile::setPermissions(docDb, QFile::ReadOwner | QFile::WriteOwner);
-    db::CreateItemDatabase(itemDb);
-    db::AddAccountTables(itemDb);
-    db::CreateDocDatabase(docDb, itemDb, workDb, {});
-    jet::Database items = jet::Database::open(itemDb);
-    items.beginTrans();
-    jet::Recordset rs = items.openRecordset(QStringLiteral("tItems"));
-    for (int i = 0; i < labels; ++i) {
-        rs.addNew();
-        rs.setValue(QStringLiteral("ItemKey"), QString::number(100000 + i));
-        rs.setValue(QStringLiteral("ItemName"), QStringLiteral("פריט %1").arg(i));
-        rs.setValue(QStringLiteral("BarCode"), ean13(i));
-        rs.setValue(QStringLiteral("Coin"), QStringLiteral("¦"));
-        rs.setValue(QStringLiteral("Price"), 9.9);
-        rs.setValue(QStringLiteral("Copies"), 1);
-        rs.setValue(QStringLiteral("PrintLabel"), true);
-        rs.update();
-    }
-    items.commitTrans();
-    return workDb;
-}
+using bench::ean13;
+using bench::median;
 
 // zint's tool, one bitmap per line of a batch file, as our bitmaps are made: EAN-13 with its
 // check digit given, a 2-pixel module, 80-pixel bars, no text.
@@ -94,28 +59,18 @@ double zintSeconds(const QString& folder, int labels) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    // Settings, the print folder and everything else of this run stay in a folder of its own,
-    // in memory when the machine has a tmpfs: a desktop's runtime folder, where the print folder
-    // lives, is one.
-    // "--disk" measures in the temporary folder instead.
+    // "--disk" measures in the temporary folder instead of memory.
     const bool disk = argc > 1 && QString(argv[argc - 1]) == "--disk";
-    const bool inMemory = !disk && QFileInfo(QStringLiteral("/dev/shm")).isWritable();
-    QTemporaryDir scratch(inMemory ? QStringLiteral("/dev/shm/etiquon-bench-XXXXXX")
-                                   : QDir::tempPath() + QStringLiteral("/etiquon-bench-XXXXXX"));
-    for (const char* var : {"XDG_CONFIG_HOME", "XDG_RUNTIME_DIR", "XDG_CACHE_HOME"}) {
-        const QString dir = scratch.path() + "/" + var;
-        QDir().mkpath(dir);
-        QFile::setPermissions(dir, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
-        qputenv(var, dir.toLocal8Bit());
-    }
+    const std::unique_ptr<QTemporaryDir> scratchDir = bench::scratchFolder(disk);
+    QTemporaryDir& scratch = *scratchDir;
+    const bool inMemory = scratch.path().startsWith(QStringLiteral("/dev/shm"));
     QCoreApplication app(argc, argv);
     const int labels =
         argc > 1 && !QString(argv[1]).startsWith("--") ? QString(argv[1]).toInt() : 10000;
     QTextStream out(stdout);
 
     const QString folder = scratch.path() + "/db";
-    QDir().mkpath(folder);
-    const QString workDb = prepareFolder(folder, labels);
+    const QString workDb = bench::prepareLabelFolder(folder, labels);
     if (workDb.isEmpty()) return 1;
 
     LabelPageInput input;

@@ -3,10 +3,12 @@
 # folder, import the company's items, mark a dozen of them with two copies each, and print their
 # labels on the built-in label page. The last line names the page; on a desktop it opens in the
 # browser.
-#   tools/demo.sh [--no-build] [--documents] [--screenshot FILE]
+#   tools/demo.sh [--no-build] [--documents] [--screenshot FILE] [--pdf-picture FILE]
 # --documents prints labels for the lines of the company's delivery notes instead: it reads the
 # documents, chooses two of them and some of their lines, and prints a label for every copy of
 # every line chosen.
+# --pdf-picture also draws the labels as a PDF without a browser (<work>/labels.pdf) and turns
+# its page into a picture.
 # The demo keeps its settings under SettingID 90 (~/.config/Etiquon/Etiquon90.ini; 91 with
 # --documents) and its files in <build>/demo (or $ETIQUON_DEMO_DIR); the page lies in the user's
 # private print folder.
@@ -15,6 +17,7 @@ cd "$(dirname "$0")/.."
 build="${ETIQUON_BUILD_DIR:-build}"
 work="${ETIQUON_DEMO_DIR:-$build/demo}"
 screenshot=""
+pdf_picture=""
 no_build=""
 documents=""
 while [ $# -gt 0 ]; do
@@ -22,7 +25,8 @@ while [ $# -gt 0 ]; do
         --no-build) no_build=1 ;;
         --documents) documents=1 ;;
         --screenshot) screenshot="$2"; shift ;;
-        *) echo "usage: tools/demo.sh [--no-build] [--documents] [--screenshot FILE]" >&2; exit 2 ;;
+        --pdf-picture) pdf_picture="$2"; shift ;;
+        *) echo "usage: tools/demo.sh [--no-build] [--documents] [--screenshot FILE] [--pdf-picture FILE]" >&2; exit 2 ;;
     esac
     shift
 done
@@ -94,5 +98,12 @@ if [ -n "$screenshot" ]; then
         --screenshot="$(realpath -m "$screenshot")" "file://$page" 2>/dev/null
     rm -rf "$profile"
     echo "screenshot: $screenshot"
+fi
+if [ -n "$pdf_picture" ]; then
+    print=print-items
+    [ -z "$documents" ] || print=print-docs
+    "$cli" "${demo[@]}" "$print" --db "$work/db" --output "$work/labels.pdf" >/dev/null
+    pdftoppm -r 70 -png -singlefile "$work/labels.pdf" "${pdf_picture%.png}"
+    echo "PDF: $work/labels.pdf, its page: $pdf_picture"
 fi
 echo "The label page: $page"

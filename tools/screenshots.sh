@@ -1,9 +1,10 @@
 #!/usr/bin/env bash
 # Pictures of the eight tabs of the control, as a new user sees them (default settings), into
-# docs/screenshots/tab-0.png .. tab-7.png. Runs the window under a virtual X display.
+# docs/screenshots/tab-0.png .. tab-7.png, and of the label designer's three tabs with the demo's
+# label (designer-0.png .. designer-2.png). Runs the window under a virtual X display.
 set -euo pipefail
 cd "$(dirname "$0")/.."
-tools/build.sh etiquon etiquon-cli document_database
+tools/build.sh etiquon etiquon-cli document_database make-demo-company
 build="${ETIQUON_BUILD_DIR:-build}"
 out="${1:-docs/screenshots}"
 
@@ -16,4 +17,10 @@ export XDG_CONFIG_HOME="$scratch/config" XDG_RUNTIME_DIR="$scratch/runtime" XDG_
 # The default database folder, prepared as a first run leaves it: tab 6 lists its document types.
 "$build/src/app/etiquon-cli" init-db --db "$XDG_DATA_HOME/Etiquon" >/dev/null
 xvfb-run -a "$build/src/app/etiquon" --screenshots "$out"
-echo "screenshots: $(ls "$out"/tab-*.png | wc -l) pictures in $out"
+
+# The label designer with the demo's label, its preview showing the demo's first marked item.
+CI=1 ETIQUON_DEMO_DIR="$scratch/demo" tools/demo.sh --no-build >/dev/null
+"$build/src/app/etiquon-cli" --setting-id 90 config set GeneralParams DBPath "$scratch/demo/db"
+xvfb-run -a "$build/src/app/etiquon" --setting-id 90 --screenshots "$scratch/demo-pictures"
+cp "$scratch"/demo-pictures/designer-*.png "$out"/
+echo "screenshots: $(ls "$out"/*.png | wc -l) pictures in $out"

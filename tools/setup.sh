@@ -16,9 +16,10 @@ packages=(
     clang libclang-rt-14-dev llvm-14
     # desktop stand-ins: printers, Hebrew fonts, a display for screenshots, a browser
     cups-client culmus fonts-dejavu-core xvfb xauth chromium
-    # the gLabels route (glabels-3-batch; pdfunite joins its PDFs), and poppler's pdftoppm and
-    # pdftotext, with which its tests read the labels back
-    glabels poppler-utils
+    # the gLabels route (glabels-3-batch; pdfunite joins its PDFs), label sheet products
+    # (gLabels' catalogue), and poppler's pdftoppm and pdftotext, with which the tests read
+    # PDFs back
+    glabels glabels-data poppler-utils
 )
 
 missing=()

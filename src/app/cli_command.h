@@ -3,6 +3,7 @@
 #include <QString>
 #include <QStringList>
 #include <functional>
+#include <optional>
 
 namespace etq {
 class Context;
@@ -23,6 +24,18 @@ struct Command {
 struct CommonOptions {
     QString settingId;  // the hosting page's SettingID: selects the settings store
 };
+
+// Where a print command's labels go instead of the route's own output: --output FILE writes
+// them to a PDF file, --printer NAME sends them to that CUPS printer (lp); both may be given.
+// Every print command and route takes them from here.
+struct PrintDestination {
+    std::optional<QString> output;
+    std::optional<QString> printer;
+    bool given() const { return output || printer; }
+};
+
+// Removes --output and --printer (with their values) from args and returns them.
+PrintDestination takePrintDestination(QStringList& args);
 
 // Removes the shared options from args and returns them.
 CommonOptions takeCommonOptions(QStringList& args);

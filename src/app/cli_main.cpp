@@ -1,8 +1,12 @@
 // etiquon-cli: the component's work without windows, for scripts, tests and the demo.
 #include <QCoreApplication>
+#include <QGuiApplication>
 #include <QRegularExpression>
 #include <QTextStream>
+#include <algorithm>
 #include <cstdio>
+#include <cstring>
+#include <memory>
 #include <span>
 
 #include "app/cli_command.h"
@@ -106,9 +110,8 @@ const Command kCommands[] = {
      "read the host's items, prices and currencies into the item database", runImportItems},
     {"mark-items", "--db DIR (--all | --none | KEY...) [--copies N]",
      "mark items for printing and set their copies", runMarkItems},
-    {"print-items", "--db DIR [--open] [--output FILE] [--printer NAME]",
-     "print the marked items' labels; prints the page's path (gLabels: the PDFs' paths)",
-     runPrintItems},
+    {"print-items", "--db DIR [--open] [--output FILE] [--printer NAME] [--outlines]",
+     "print the marked items' labels; prints the page's (or the PDFs') paths", runPrintItems},
     {"import-docs",
      "--company DIR --db DIR [--from-date DD/MM/YYYY] [--to-date DD/MM/YYYY] [--from-num N] [--to-num N] [--read-items] [--fast]",
      "read the host's stock documents of the types to scan into the working database",
@@ -130,8 +133,9 @@ const Command kCommands[] = {
      runExcludeLines},
     {"set-copies", "--db DIR DOC LINE COPIES", "set the label copies of a document line",
      runSetCopies},
-    {"print-docs", "--db DIR [--open]",
-     "print the included document lines' labels; prints the page's path", runPrintDocs},
+    {"print-docs", "--db DIR [--open] [--output FILE] [--printer NAME] [--outlines]",
+     "print the included document lines' labels; prints the page's (or the PDFs') paths",
+     runPrintDocs},
 };
 
 void printHelp() {
@@ -152,7 +156,19 @@ void printHelp() {
 
 int main(int argc, char** argv) {
     using namespace etq::cli;
-    QCoreApplication app(argc, argv);
+    // A command that may draw the labels' PDF needs Qt's fonts, which only a GUI application
+    // has; the program never shows a window, so the offscreen platform serves without a display.
+    const bool draws = std::any_of(argv + 1, argv + argc, [](const char* arg) {
+        return std::strcmp(arg, "print-items") == 0 || std::strcmp(arg, "print-docs") == 0;
+    });
+    std::unique_ptr<QCoreApplication> application;
+    if (draws) {
+        if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM")) qputenv("QT_QPA_PLATFORM", "offscreen");
+        application = std::make_unique<QGuiApplication>(argc, argv);
+    } else {
+        application = std::make_unique<QCoreApplication>(argc, argv);
+    }
+    QCoreApplication& app = *application;
     QCoreApplication::setApplicationName("etiquon-cli");
     QCoreApplication::setApplicationVersion(ETIQUON_VERSION);
 

@@ -20,7 +20,10 @@
 #include "platform/messages.h"
 #include "platform/printers.h"
 #include "platform/progress.h"
+#include "print/label_definition.h"
+#include "print/label_pdf.h"
 #include "print/label_query.h"
+#include "print/label_software.h"
 #include "print/print_engine.h"
 #include "surface/control_values.h"
 
@@ -54,23 +57,6 @@ EntryList printerEntries() {
     return entries;
 }
 
-// Where a print run's labels go, as the command line says: --output FILE keeps them in that
-// file and prints nothing; --printer NAME prints on that CUPS printer instead of the one the
-// settings choose. Every print route takes its destination from here.
-struct PrintDestination {
-    std::optional<QString> output;
-    std::optional<QString> printer;
-};
-
-PrintDestination takePrintDestination(QStringList& args) {
-    PrintDestination destination;
-    if (const QString output = takeOption(args, "--output"); !output.isEmpty())
-        destination.output = QFileInfo(output).absoluteFilePath();
-    if (const QString printer = takeOption(args, "--printer"); !printer.isEmpty())
-        destination.printer = printer;
-    return destination;
-}
-
 // The item print through label software: the engine on the stored settings. Prints the path of
 // every PDF gLabels made, then the output file when one was asked for.
 int printWithLabelSoftwareRoute(const StoredValues& stored, const ItemPrintOptions& item,
@@ -100,6 +86,25 @@ int printWithLabelSoftwareRoute(const StoredValues& stored, const ItemPrintOptio
     return 0;
 }
 
+// The built-in labels' PDF: where the command line sends it, or else the direct print of the
+// settings; nothing for the browser page. The printer chosen in the settings gives the paper
+// also when the PDF is only written.
+std::optional<PdfDestination> pdfDestinationOf(const PrintDestination& given,
+                                               const ControlValues& stored, bool outlines) {
+    std::optional<PdfDestination> destination = readPdfDestination(stored);
+    if (given.given()) {
+        destination = PdfDestination{};
+        destination->file = given.output;
+        destination->send = given.printer.has_value();
+        destination->printer =
+            given.printer.value_or(stored.listIndex(QStringLiteral("cmbPrinter")) >= 0
+                                       ? stored.text(QStringLiteral("cmbPrinter"))
+                                       : QString());
+    }
+    if (destination) destination->outlines = outlines;
+    return destination;
+}
+
 int markUsage() {
     printError(
         "usage: etiquon-cli mark-items --db DIR (--all | --none | KEY...) [--copies N] [--setting-id N]");
@@ -107,6 +112,22 @@ int markUsage() {
 }
 
 }  // namespace
+
+PrintDestination takePrintDestination(QStringList& args) {
+    // Given as "--name VALUE" or "--name=VALUE"; an empty value is kept, for the usage to refuse.
+    auto take = [&args](const QString& name) -> std::optional<QString> {
+        for (const QString& arg : args)
+            if (arg == name || arg.startsWith(name + u'=')) return takeOption(args, name);
+        return std::nullopt;
+    };
+    PrintDestination destination;
+    destination.output = take(QStringLiteral("--output"));
+    destination.printer = take(QStringLiteral("--printer"));
+    // A label program writes from its own working folder: the file is named absolutely.
+    if (destination.output && !destination.output->isEmpty())
+        destination.output = QFileInfo(*destination.output).absoluteFilePath();
+    return destination;
+}
 
 int runMarkItems(const QStringList& arguments) {
     QStringList args = arguments;
@@ -170,13 +191,15 @@ namespace {
 int runPrint(const QStringList& arguments, quint8 queryType) {
     QStringList args = arguments;
     const CommonOptions common = takeCommonOptions(args);
+    const PrintDestination destination = takePrintDestination(args);
     const QString folder = takeOption(args, "--db");
     const bool open = takeFlag(args, "--open");
-    const PrintDestination destination = takePrintDestination(args);
-    if (folder.isEmpty() || !args.isEmpty()) {
+    const bool outlines = takeFlag(args, "--outlines");
+    if (folder.isEmpty() || !args.isEmpty() || destination.output == QString() ||
+        destination.printer == QString()) {
         printError(
             QString(
-                "usage: etiquon-cli %1 --db DIR [--open] [--output FILE] [--printer NAME] [--setting-id N]")
+                "usage: etiquon-cli %1 --db DIR [--open] [--output FILE] [--printer NAME] [--outlines] [--setting-id N]")
                 .arg(queryType == ItemLabels ? "print-items" : "print-docs"));
         return 2;
     }
@@ -202,10 +225,28 @@ int runPrint(const QStringList& arguments, quint8 queryType) {
     if (runReporting([&] { options = readItemPrintOptions(stored, queryType); })) return 1;
     if (options.kind != kBuiltInPage)
         return printWithLabelSoftwareRoute(stored, options, destination, context);
-    if (destination.output || destination.printer) {
-        printError("--output and --printer take the gLabels route; the built-in page has none");
-        return 2;
+
+    if (const std::optional<PdfDestination> pdf = pdfDestinationOf(destination, stored, outlines)) {
+        options.printer.reset();  // the job names its printer; the user's default stays
+        PdfLabels labels;
+        const int status = runReporting([&] {
+            const QString workDb = prepareItemPrint(options);
+            labels = printLabelsPdf(workDb, options.page, loadedLabelDefinition(context), *pdf,
+                                    progress);
+        });
+        if (status != 0) return status;
+        if (!labels.refusedBarcodes.isEmpty())
+            printError(QStringLiteral("%1 labels have no barcode:\n%2")
+                           .arg(labels.refusedBarcodes.size())
+                           .arg(labels.refusedBarcodes.join(u'\n')));
+        QTextStream(stdout) << labels.labels << " labels on " << labels.pages
+                            << (labels.pages == 1 ? " page" : " pages")
+                            << (pdf->send && labels.labels > 0 ? " sent to the printer" : "")
+                            << "\n"
+                            << labels.path << Qt::endl;
+        return sink.failures ? 1 : 0;
     }
+
     BuiltInPrint print;
     const int status = runReporting([&] { print = printLabels(options, context, progress); });
     if (status != 0) return status;

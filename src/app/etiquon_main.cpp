@@ -7,6 +7,7 @@
 #include <QVBoxLayout>
 
 #include "card/main_card.h"
+#include "dialogs/label_designer_window.h"
 #include "platform/context.h"
 #include "platform/qt_browser.h"
 #include "platform/qt_messages.h"
@@ -25,6 +26,20 @@ int saveScreenshots(QWidget& window, etq::MainCard& card, const QString& folder)
         QApplication::processEvents();
         const QString file = QDir(folder).filePath(QStringLiteral("tab-%1.png").arg(tab));
         if (!window.grab().save(file)) {
+            QTextStream(stderr) << "etiquon: cannot write " << file << Qt::endl;
+            return 1;
+        }
+    }
+    // And the label designer, tab by tab: designer-0.png to designer-2.png.
+    const std::unique_ptr<etq::LabelDesignerWindow> designer =
+        card.makeLabelDesigner(card.control(QStringLiteral("txtDBPath")).text());
+    designer->show();
+    auto* tabs = designer->findChild<QTabWidget*>(QStringLiteral("SSTab1"));
+    for (int tab = 0; tabs && tab < tabs->count(); ++tab) {
+        tabs->setCurrentIndex(tab);
+        QApplication::processEvents();
+        const QString file = QDir(folder).filePath(QStringLiteral("designer-%1.png").arg(tab));
+        if (!designer->grab().save(file)) {
             QTextStream(stderr) << "etiquon: cannot write " << file << Qt::endl;
             return 1;
         }

@@ -79,6 +79,7 @@ struct CommandTable {
             {u"cmdSaveDef5", &CardController::saveLabelByDocs},
             {u"cmdSaveDef6", &CardController::saveByDocsDef},
             {u"CmdDir", &CardController::chooseFile},
+            {u"OptOLE", &CardController::chooseRoute},
         };
         return kEntries;
     }
@@ -359,6 +360,16 @@ void CardController::saveLabelByDocs(int) {
 
 void CardController::saveByDocsDef(int) {
     GetSetParams(surface_, context_.applicationName, 6, SaveSettings);
+}
+
+// The built-in label chosen after start-up: its definition is loaded now (unless this run has
+// it already), so that the designer, a save and a print all work on the stored one.
+void CardController::chooseRoute(int index) {
+    passOver([&] {
+        if (index == 3 && surface_.control(QStringLiteral("OptOLE"), 3).value().toBool() &&
+            hooks_.labelDefinition)
+            hooks_.labelDefinition(LoadSettings);
+    });
 }
 
 // CmdDir(0) chooses the head label file, CmdDir(1) the line label file, CmdDir(2) the label

@@ -32,7 +32,8 @@ struct CardHooks {
     std::function<void(const Surface&, Context&)> fillCmbPrice;
     std::function<void(const Surface&, Context&)> fillCmbItmQGrp;
     std::function<void(const Surface&, Context&)> fillCmbItmBelong;
-    // Moves the built-in label definition: 1 writes it to the store, 2 reads it.
+    // Moves the built-in label definition: 1 writes it to the store, 2 reads it (when the run
+    // has not yet).
     std::function<void(quint8 action)> labelDefinition;
     // Upgrades the item database at the path; the path on success, empty text on failure.
     std::function<QString(const QString& itemDatabase)> upgradeItemDatabase;
@@ -116,6 +117,7 @@ class CardController {
     void saveLabelByDocs(int);
     void saveByDocsDef(int);
     void chooseFile(int index);
+    void chooseRoute(int index);
 
     Surface& surface_;
     Context& context_;

@@ -28,8 +28,11 @@ void connectParts(CardController& controller, Surface& surface) {
     hooks.fillCmbPrice = [](const Surface& s, Context& c) { FillCmbPrice(s, c); };
     hooks.fillCmbItmQGrp = [](const Surface& s, Context& c) { FillCmbItmQGrp(s, c); };
     hooks.fillCmbItmBelong = [](const Surface& s, Context& c) { FillCmbItmBelong(s, c); };
+    // A load keeps what the designer changed since an earlier one; a save writes the user's
+    // definition, never the empty one of a run that has not loaded it.
     hooks.labelDefinition = [&context](quint8 action) {
-        GetSetLabelDef(action, context.applicationName, context.labelDefinition());
+        LabelDefinition& definition = loadedLabelDefinition(context);
+        if (action == SaveLabelDef) GetSetLabelDef(action, context.applicationName, definition);
     };
     controller.setWork(QStringLiteral("CmdImportItems"),
                        [&surface, &context](int) { CmdImportItems(surface, context); });

@@ -17,15 +17,19 @@
 
 #include "card/card_controller.h"
 #include "card/component.h"
+#include "card/print_adapters.h"
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/edit_ranges_window.h"
+#include "dialogs/label_designer_window.h"
 #include "dialogs/logon_dialog.h"
 #include "dialogs/select_doc_item_window.h"
 #include "dialogs/select_item_window.h"
 #include "platform/captions.h"
 #include "platform/context.h"
 #include "platform/qt_file_chooser.h"
+#include "print/label_pdf.h"
 #include "print/label_query.h"
+#include "surface/control_values.h"
 #include "surface/surface_controls.h"
 
 namespace etq {
@@ -227,6 +231,7 @@ MainCard::MainCard(Context& context, QWidget* parent)
     connectDocTypeGrid();
     connectItemSelection();
     connectDocumentWindows();
+    connectLabelDesigner();
     connectParts(*controller_, *this);
 }
 
@@ -243,6 +248,23 @@ void MainCard::connectDocumentWindows() {
                                 this);
         window.exec();
     });
+}
+
+// cmdLabDesign opens the label designer on the run's definition; the card is its surface
+// reference, the database folder the one the control took for its dialogs.
+void MainCard::connectLabelDesigner() {
+    controller_->setWork(QStringLiteral("cmdLabDesign"), [this](int) {
+        const std::unique_ptr<LabelDesignerWindow> window =
+            makeLabelDesigner(controller_->databaseFolder());
+        window->exec();
+    });
+}
+
+std::unique_ptr<LabelDesignerWindow> MainCard::makeLabelDesigner(const QString& databaseFolder) {
+    const ItemPrintOptions options = readItemPrintOptions(SurfaceValues(*this));
+    LabelPreviewSource source{databaseFolder, options.page};
+    if (options.printer) source.paper = printerPaperSize(*options.printer);
+    return std::make_unique<LabelDesignerWindow>(controller_->context(), *this, source, this);
 }
 
 // cmdSelectItems opens the item selection window: the label tab's item range narrows the list,
@@ -454,6 +476,9 @@ void MainCard::connectEvents(QWidget* widget, const QString& name, int index) {
                 [this, name, index] { controller_->click(name, index); });
     } else if (auto* label = qobject_cast<ClickLabel*>(widget)) {
         connect(label, &ClickLabel::clicked, this,
+                [this, name, index] { controller_->click(name, index); });
+    } else if (auto* option = qobject_cast<QRadioButton*>(widget)) {
+        connect(option, &QRadioButton::clicked, this,
                 [this, name, index] { controller_->click(name, index); });
     } else if (auto* edit = qobject_cast<QLineEdit*>(widget)) {
         connect(edit, &QLineEdit::textChanged, this,

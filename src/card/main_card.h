@@ -13,6 +13,7 @@ namespace etq {
 
 class CardController;
 class Context;
+class LabelDesignerWindow;
 struct ControlSpec;
 class QtFileChooser;
 
@@ -39,6 +40,10 @@ class MainCard : public QWidget, public Surface {
     int elementCount(const QString& name) const override;
     QTabWidget* mainTab() const { return mainTab_; }
 
+    // The label designer as cmdLabDesign opens it, on the run's definition, with the first item
+    // the label tab's settings mark in the database folder in its preview.
+    std::unique_ptr<LabelDesignerWindow> makeLabelDesigner(const QString& databaseFolder);
+
   protected:
     Control* find(const QString& name, int index) const override;
 
@@ -51,6 +56,7 @@ class MainCard : public QWidget, public Surface {
     void connectDocTypeGrid();
     void connectItemSelection();
     void connectDocumentWindows();
+    void connectLabelDesigner();
 
     QTabWidget* mainTab_ = nullptr;
     std::vector<std::unique_ptr<WidgetControl>> controls_;

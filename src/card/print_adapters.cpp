@@ -31,6 +31,20 @@ LabelPageInput readLabelPageInput(const ControlValues& values, quint8 queryType)
             values.text(QStringLiteral("txtPriceFormat"))};
 }
 
+// The direct print: the labels' PDF drawn here and sent to the printer.
+QString printDirect(Surface& surface, Context& context, const QString& dbName,
+                    LabelPageInput& input, const PdfDestination& destination) {
+    SurfaceProgress progress(surface);
+    PdfLabels pdf;
+    const bool printed = reportFailures(context, kPageFailureTitle, [&] {
+        pdf = printLabelsPdf(dbName, input, loadedLabelDefinition(context), destination, progress);
+    });
+    showFieldChecks(surface, input.query);
+    if (!printed) return {};
+    if (!pdf.refusedBarcodes.isEmpty()) tellRefusedBarcodes(context, pdf.refusedBarcodes);
+    return pdf.path;
+}
+
 }  // namespace
 
 qint16 GetLabelSoftwareKind(const ControlValues& values) {
@@ -74,6 +88,15 @@ ItemPrintOptions readItemPrintOptions(const ControlValues& values, quint8 queryT
     return options;
 }
 
+std::optional<PdfDestination> readPdfDestination(const ControlValues& values) {
+    if (values.listIndex(QStringLiteral("cmbPrintMode")) != kDirectPrint) return std::nullopt;
+    PdfDestination destination;
+    destination.send = true;
+    if (values.listIndex(QStringLiteral("cmbPrinter")) >= 0)
+        destination.printer = values.text(QStringLiteral("cmbPrinter"));
+    return destination;
+}
+
 void showFieldChecks(const Surface& surface, const LabelQueryInput& query) {
     for (const LabelFieldSlot& slot : labelFieldSlots()) {
         const ControlRef box = surface.control(QStringLiteral("ChkFldSend"), slot.slot);
@@ -83,11 +106,14 @@ void showFieldChecks(const Surface& surface, const LabelQueryInput& query) {
 
 QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& dbName,
                            quint8 queryType) {
+    const SurfaceValues values(surface);
+    LabelPageInput input = readLabelPageInput(values, queryType);
+    if (const std::optional<PdfDestination> destination = readPdfDestination(values))
+        return printDirect(surface, context, dbName, input, *destination);
     SurfaceProgress progress(surface);
-    LabelPageInput input = readLabelPageInput(SurfaceValues(surface), queryType);
     BuiltInPrint print;
     const bool printed = reportFailures(context, kPageFailureTitle, [&] {
-        print = printBuiltInLabels(dbName, input, context.labelDefinition(), progress);
+        print = printBuiltInLabels(dbName, input, loadedLabelDefinition(context), progress);
     });
     showFieldChecks(surface, input.query);
     if (!printed) return {};
@@ -135,6 +161,8 @@ QString PrintLabels(Surface& surface, Context& context, quint8 queryType) {
     QString workDb;
     if (!reportFailures(context, context.caption(1), [&] {
             options = readItemPrintOptions(values, queryType);
+            // A direct print names its printer in the job; the user's default stays.
+            if (readPdfDestination(values)) options.printer.reset();
             workDb = prepareItemPrint(options);
         }))
         return {};
@@ -157,7 +185,7 @@ void CreateLabFile(Surface& surface, Context& context, const QString& fileName,
                          values.text(QStringLiteral("txtPriceFormat"))};
     // The boxes of the cells' fields are ticked also when the page fails after ticking them.
     try {
-        writeLabelPage(fileName, dbName, input, context.labelDefinition(), progress);
+        writeLabelPage(fileName, dbName, input, loadedLabelDefinition(context), progress);
     } catch (...) {
         showFieldChecks(surface, input.query);
         throw;

@@ -5,7 +5,9 @@
 // routines, which report as the window always has.
 
 #include <QString>
+#include <optional>
 
+#include "print/label_pdf.h"
 #include "print/print_engine.h"
 #include "print/print_items.h"
 
@@ -33,13 +35,22 @@ LabelQueryInput readLabelQueryInput(const ControlValues& values, quint8 queryTyp
 // and the label page's settings (item labels unless told, in the printer type's order).
 ItemPrintOptions readItemPrintOptions(const ControlValues& values, quint8 queryType = ItemLabels);
 
+// The list beside the printer list (cmbPrintMode): 0 the page in the browser, 1 direct print.
+inline constexpr int kDirectPrint = 1;
+
+// With direct print chosen, the PDF goes to the printer chosen in cmbPrinter (the default
+// printer when none is); nothing for the browser page.
+std::optional<PdfDestination> readPdfDestination(const ControlValues& values);
+
 // Ticks the boxes of the fields the query was given (the label page ticks those its cells show).
 void showFieldChecks(const Surface& surface, const LabelQueryInput& query);
 
 // The built-in print run on the database dbName with the label tab's settings and the context's
-// label definition: the page is shown through the context's page viewer. A failure is shown
-// with the title "תקלה" and ends the run; a record whose barcode cannot be made is told after
-// the page. Returns the page's path, or empty text when nothing was printed.
+// label definition (loaded first when the run has not yet): the page is shown through the
+// context's page viewer, or, with direct print chosen, the labels' PDF is sent to the printer. A
+// failure is shown with the title "תקלה" and ends the run; a record whose barcode cannot be made is
+// told after the page. Returns the page's path (the PDF's for a direct print), or empty text when
+// nothing was printed.
 QString PrintBuiltInLabels(Surface& surface, Context& context, const QString& dbName,
                            quint8 queryType);
 

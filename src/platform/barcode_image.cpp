@@ -73,12 +73,18 @@ bool isBitmapName(const QString& path) {
     return path.endsWith(QLatin1String(".bmp"), Qt::CaseInsensitive);
 }
 
-// What zint is asked to encode for one bitmap.
-struct Encoding {
+}  // namespace
+
+// What zint is asked to encode for one symbol.
+struct BarcodeImage::Encoding {
     int symbology = 0;
     int option2 = 0;
     QByteArray data;
 };
+
+namespace {
+
+using Encoding = BarcodeImage::Encoding;
 
 // EAN symbols always carry a check digit, so the number of digits given decides: up to the
 // payload length (7 for EAN-8, 12 for EAN-13) the digits are zero-padded on the left and the
@@ -99,8 +105,8 @@ QString prepareEan(const BarType& type, const QString& text, Encoding& out) {
 }
 
 // Returns the reason when the text cannot be encoded as this bar type.
-QString prepareEncoding(const BarType& type, const QString& text, bool checkDigit, bool fullAscii,
-                        Encoding& out) {
+QString encodingOf(const BarType& type, const QString& text, bool checkDigit, bool fullAscii,
+                   Encoding& out) {
     if (type.family == Family::Ean) return prepareEan(type, text, out);
     out.symbology = type.symbology;
     out.data = hostBytes(text);
@@ -150,19 +156,32 @@ QString settingsProblem(const BarcodeSettings& s) {
 }
 
 // Sets every input of the reused symbol: encoding writes some of them back (the height, for
-// one), so nothing may carry over from the previous bitmap.
+// one), so nothing may carry over from the previous symbol. `scale` is half the units of one
+// module, `height` the bars' height in modules.
 void prepareSymbol(zint_symbol* symbol, const BarcodeSettings& s, const Encoding& encoding,
-                   const QByteArray& fileName) {
+                   float scale, float height) {
     ZBarcode_Clear(symbol);
     symbol->symbology = encoding.symbology;
     symbol->input_mode = DATA_MODE;
     symbol->option_2 = encoding.option2;
-    symbol->scale = scaleForNarrowBar(double(s.dimX) * s.resoX);
-    const double barPixels = std::max(1.0, std::round(double(s.barHeight) * s.resoY));
-    symbol->height = float(barPixels / (2.0 * symbol->scale));
+    symbol->scale = scale;
+    symbol->height = height;
     symbol->show_hrt = s.showDesc ? 1 : 0;
+}
+
+// The bitmap's pixels: the narrow bar a whole number of them, the bars as high as the setting
+// at its resolution.
+void prepareBitmapSymbol(zint_symbol* symbol, const BarcodeSettings& s, const Encoding& encoding,
+                         const QByteArray& fileName) {
+    const float scale = scaleForNarrowBar(double(s.dimX) * s.resoX);
+    const double barPixels = std::max(1.0, std::round(double(s.barHeight) * s.resoY));
+    prepareSymbol(symbol, s, encoding, scale, float(barPixels / (2.0 * scale)));
     std::memcpy(symbol->outfile, fileName.constData(), size_t(fileName.size()) + 1);
 }
+
+// zint's vector unit is two scales: a scale of one half makes a module one unit.
+constexpr float kModuleScale = 0.5f;
+constexpr double kMillimetresPerInch = 25.4;
 
 }  // namespace
 
@@ -201,31 +220,67 @@ bool BarcodeImage::OutputBitmap(const QString& path) {
     return fail(problem);
 }
 
-QString BarcodeImage::writeBitmap(const QByteArray& fileName) {
+QString BarcodeImage::prepareEncoding(Encoding& encoding) const {
     const BarType* type = findBarType(settings_.barType);
     if (!type) return QStringLiteral("Unknown barcode type %1").arg(settings_.barType);
     if (const QString problem = settingsProblem(settings_); !problem.isEmpty()) return problem;
     const QString& text = settings_.data;
     if (text.isEmpty()) return QStringLiteral("No data for the %1 barcode").arg(type->name);
-    Encoding encoding;
     const QString refusal =
-        prepareEncoding(*type, text, settings_.checkDigit, settings_.c39Ascii, encoding);
+        encodingOf(*type, text, settings_.checkDigit, settings_.c39Ascii, encoding);
     if (!refusal.isEmpty()) return QStringLiteral("%1 (data \"%2\")").arg(refusal, text);
+    return {};
+}
 
+QString BarcodeImage::encodeFailure() const {
+    const BarType* type = findBarType(settings_.barType);
+    return QStringLiteral("%1 barcode of \"%2\": %3")
+        .arg(type ? type->name : "", settings_.data, QString::fromUtf8(symbol_->errtxt));
+}
+
+QString BarcodeImage::writeBitmap(const QByteArray& fileName) {
+    Encoding encoding;
+    if (const QString refusal = prepareEncoding(encoding); !refusal.isEmpty()) return refusal;
     zint_symbol* symbol = symbol_.get();
-    prepareSymbol(symbol, settings_, encoding, fileName);
+    prepareBitmapSymbol(symbol, settings_, encoding, fileName);
     const auto* data = reinterpret_cast<const unsigned char*>(encoding.data.constData());
     if (ZBarcode_Encode(symbol, data, int(encoding.data.size())) >= ZINT_ERROR ||
-        ZBarcode_Buffer(symbol, settings_.rotation) >= ZINT_ERROR) {
-        return QStringLiteral("%1 barcode of \"%2\": %3")
-            .arg(type->name, text, QString::fromUtf8(symbol->errtxt));
-    }
+        ZBarcode_Buffer(symbol, settings_.rotation) >= ZINT_ERROR)
+        return encodeFailure();
     // zint's raster, written as the BMP its own output makes, without its per-pixel conversion.
     QString error;
     if (!writeMonochromeBmp(fileName, symbol->bitmap, symbol->bitmap_width, symbol->bitmap_height,
                             &error))
         return error;
     return {};
+}
+
+bool BarcodeImage::OutputVector(BarcodeVector& out) {
+    out = {};
+    if (!symbol_) return fail(QStringLiteral("The barcode library has no memory for a symbol"));
+    Encoding encoding;
+    if (const QString refusal = prepareEncoding(encoding); !refusal.isEmpty()) return fail(refusal);
+    zint_symbol* symbol = symbol_.get();
+    prepareSymbol(symbol, settings_, encoding, kModuleScale, settings_.barHeight / settings_.dimX);
+    const auto* data = reinterpret_cast<const unsigned char*>(encoding.data.constData());
+    if (ZBarcode_Encode(symbol, data, int(encoding.data.size())) >= ZINT_ERROR ||
+        ZBarcode_Buffer_Vector(symbol, settings_.rotation) >= ZINT_ERROR)
+        return fail(encodeFailure());
+
+    const double module = double(settings_.dimX) * kMillimetresPerInch;
+    const zint_vector* vector = symbol->vector;
+    out.size = QSizeF(vector->width * module, vector->height * module);
+    for (const zint_vector_rect* r = vector->rectangles; r; r = r->next)
+        out.bars.emplace_back(r->x * module, r->y * module, r->width * module, r->height * module);
+    for (const zint_vector_string* t = vector->strings; t; t = t->next) {
+        const auto halign = t->halign == 1   ? BarcodeVector::Text::Left
+                            : t->halign == 2 ? BarcodeVector::Text::Right
+                                             : BarcodeVector::Text::Centre;
+        out.texts.push_back({QPointF(t->x * module, t->y * module), t->fsize * module, halign,
+                             QString::fromUtf8(reinterpret_cast<const char*>(t->text), t->length)});
+    }
+    lastError_.clear();
+    return true;
 }
 
 }  // namespace etq

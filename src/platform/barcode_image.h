@@ -1,8 +1,11 @@
 #pragma once
 
+#include <QPointF>
+#include <QRectF>
 #include <QString>
 
 #include <memory>
+#include <vector>
 
 struct zint_symbol;
 
@@ -32,6 +35,22 @@ struct BarcodeSettings {
     bool showDesc = false;
     int resoX = 200;
     int resoY = 200;
+};
+
+// A symbol as shapes, to be drawn sharp at any size: its bars and the human-readable text, in
+// millimetres from the symbol's top left corner. A module is DimX inches wide and the bars are
+// BarHeight inches high, whatever the resolution.
+struct BarcodeVector {
+    struct Text {
+        enum Align { Centre, Left, Right };
+        QPointF baseline;  // the point of the baseline that `align` names
+        double size;       // the font's size, in millimetres
+        Align align;
+        QString text;
+    };
+    QSizeF size;
+    std::vector<QRectF> bars;
+    std::vector<Text> texts;
 };
 
 // The barcode library's instance: settings made through the setters stay until changed, and
@@ -84,7 +103,12 @@ class BarcodeImage {
     // case). On failure returns false, leaves no file under that name and keeps the reason
     // in lastError(); a success clears it.
     bool OutputBitmap(const QString& path);
+    // The same symbol as shapes (the resolution does not matter). On failure returns false, with
+    // the reason in lastError(), and `out` empty.
+    bool OutputVector(BarcodeVector& out);
     const QString& lastError() const { return lastError_; }
+
+    struct Encoding;
 
   private:
     struct SymbolDeleter {
@@ -92,6 +116,9 @@ class BarcodeImage {
     };
 
     bool fail(const QString& reason);
+    // What zint is to encode for the current settings; the reason when they cannot be encoded.
+    QString prepareEncoding(Encoding& encoding) const;
+    QString encodeFailure() const;
     // Encodes the current settings and writes the bitmap; the reason when it cannot.
     QString writeBitmap(const QByteArray& fileName);
 

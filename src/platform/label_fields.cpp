@@ -6,15 +6,16 @@ namespace etq {
 
 namespace {
 
-// Some slots share a result column (`Local` for 5 and 31), some send under the variable "-":
-// the label software receives them as they are.
+// Some slots send under the variable "-": the label software receives them as they are. The unit
+// (slot 5) is read from `Unit`, the column the item import fills; `Local`, which nothing writes,
+// is left to slot 31.
 constexpr std::array<LabelFieldSlot, kLabelFieldCount> kSlots = {{
     {0, u"Item code", u"ItemKey", u"1", u"ItemKey", u"מפתח פריט"},
     {1, u"Item name", u"ItemName", u"1", u"ItemName", u"שם פריט"},
     {2, u"", u"ItemSort", u"", u"ItemSort", u"קבוצת פריט"},
     {3, u"Foreign name", u"FName", u"1", u"FName", u"שם לועזי"},
     {4, u"Barcode", u"BarCode", u"1", u"BarCode", u"ברקוד"},
-    {5, u"Unit", u"Unit", u"1", u"Local", u"יחידת מידה"},
+    {5, u"Unit", u"Unit", u"1", u"Unit", u"יחידת מידה"},
     {6, u"Price", u"Price", u"2", u"Price", u"מחיר"},
     {7, u"Currency", u"CoinSign", u"1", u"CoinSign", u"מטבע"},
     {8, u"Serial Number", u"SerialNum", u"1", u"SerialNum", u"מספר סידורי"},

@@ -48,10 +48,27 @@ void setDefaultPrinter(const QString& name) {
     runCups(QStringLiteral("lpoptions"), {QStringLiteral("-d"), name});
 }
 
+// lpoptions -l lists one option a line, "PageSize/Media Size: Letter *A4 Legal", the default
+// marked with a star.
+QString printerPaper(const QString& name) {
+    QStringList args;
+    if (!name.isEmpty()) args << QStringLiteral("-p") << name;
+    args << QStringLiteral("-l");
+    const QByteArray output = runCups(QStringLiteral("lpoptions"), args);
+    for (const QByteArray& line : output.split('\n')) {
+        if (!line.startsWith("PageSize/") && !line.startsWith("PageSize:")) continue;
+        const qsizetype colon = line.indexOf(':');
+        for (const QByteArray& choice : line.mid(colon + 1).split(' '))
+            if (choice.startsWith('*')) return QString::fromLocal8Bit(choice.mid(1));
+    }
+    return {};
+}
+
 void sendToPrinter(const QString& file, const std::optional<QString>& printer) {
     QStringList args;
     if (printer) args << QStringLiteral("-d") << *printer;
-    runCups(QStringLiteral("lp"), args << file);
+    args << QStringLiteral("--") << file;
+    runCups(QStringLiteral("lp"), args);
 }
 
 }  // namespace etq

@@ -15,6 +15,11 @@ QStringList installedPrinters();
 // CUPS refuses.
 void setDefaultPrinter(const QString& name);
 
+// The paper the printer `name` (empty: the user's default printer) prints on by default, as CUPS
+// names it in its PageSize option: "A4", "Letter", "w288h432"... Throws Failure with the reason
+// when CUPS cannot be asked; empty text when the printer has no such option.
+QString printerPaper(const QString& name);
+
 // Sends a file to the CUPS printer `printer` with lp, or to the CUPS default when none is named.
 // Throws Failure with CUPS's reason when it refuses.
 void sendToPrinter(const QString& file, const std::optional<QString>& printer);

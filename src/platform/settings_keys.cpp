@@ -28,6 +28,8 @@ constexpr SettingKey kKeys[] = {
     {1, u"GeneralParams", u"LabelSoftware", u"txtLabelSoftware", -1, false, T::Text, u""},
     // The printer is kept by name; "-1" names none, so nothing is selected.
     {1, u"GeneralParams", u"DefPrinter", u"cmbPrinter", -1, false, T::Text, u"-1"},
+    // The built-in labels: 0 the page in the browser, 1 a PDF sent straight to the printer.
+    {1, u"GeneralParams", u"PrintMode", u"cmbPrintMode", -1, false, T::ListIndex, u"0"},
 
     {2, u"ImportItems", u"ItemNameType", u"CmbItemNameType", -1, false, T::ListIndex, u"0"},
     {2, u"ImportItems", u"PriceField", u"cmbPriceField", -1, false, T::ListIndex, u"0"},

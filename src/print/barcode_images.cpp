@@ -2,9 +2,9 @@
 
 #include "jet/database.h"
 #include "jet/recordset.h"
-#include "jet/vb.h"
 #include "platform/barcode_image.h"
 #include "platform/user_paths.h"
+#include "print/label_faces.h"
 
 #include <algorithm>
 #include <map>
@@ -37,29 +37,8 @@ int flag(bool on) {
     return on ? kOn : 0;
 }
 
-// The text a record's value encodes: cut first, then the prefix.
-QString encodedText(const QVariant& value, const LabelBarDef& barDef) {
-    QString text = vb::toText(value);
-    if (barDef.LeftLen > 0) text = text.left(barDef.LeftLen);
-    if (!barDef.LeftPrefix.isEmpty()) text = barDef.LeftPrefix + text;
-    return text;
-}
-
-}  // namespace
-
-QString BmpName(int fldId, qint32 recordNo) {
-    return QStringLiteral("B%1%2.BMP")
-        .arg(fldId, 2, 10, QLatin1Char('0'))
-        .arg(recordNo, 5, 10, QLatin1Char('0'));
-}
-
-BarTypeMapping mapBarType(qint16 barType) {
-    if (barType >= 0 && barType < qint16(std::size(kBarTypes))) return kBarTypes[barType];
-    return {barType, false};
-}
-
-bool WriteBarcodeBitmap(const QString& text, const QString& fileName, LabelBarDef& barDef,
-                        BarcodeImage& instance) {
+// Every setter, in the library's order, with the values the label passes.
+void setUpInstance(const QString& text, LabelBarDef& barDef, BarcodeImage& instance) {
     instance.SetUnit(0);
     instance.SetBarType(barDef.BarType);
     instance.SetData(text);
@@ -82,7 +61,38 @@ bool WriteBarcodeBitmap(const QString& text, const QString& fileName, LabelBarDe
     instance.SetUPCEUser(0);
     instance.SetUserResoX(kResolution);
     instance.SetUserResoY(kResolution);
+}
+
+}  // namespace
+
+QString BmpName(int fldId, qint32 recordNo) {
+    return QStringLiteral("B%1%2.BMP")
+        .arg(fldId, 2, 10, QLatin1Char('0'))
+        .arg(recordNo, 5, 10, QLatin1Char('0'));
+}
+
+BarTypeMapping mapBarType(qint16 barType) {
+    if (barType >= 0 && barType < qint16(std::size(kBarTypes))) return kBarTypes[barType];
+    return {barType, false};
+}
+
+bool WriteBarcodeBitmap(const QString& text, const QString& fileName, LabelBarDef& barDef,
+                        BarcodeImage& instance) {
+    setUpInstance(text, barDef, instance);
     return instance.OutputBitmap(fileName);
+}
+
+bool MakeBarcodeVector(const QString& text, LabelBarDef& barDef, BarcodeImage& instance,
+                       BarcodeVector& out) {
+    setUpInstance(text, barDef, instance);
+    return instance.OutputVector(out);
+}
+
+LabelBarDef mappedBarDef(LabelBarDef barDef) {
+    const BarTypeMapping mapping = mapBarType(barDef.BarType);
+    barDef.BarType = qint16(mapping.libraryCode);
+    if (mapping.fullAscii) barDef.C39Ascii = true;
+    return barDef;
 }
 
 BarcodeBatch collectBarcodes(const QString& folder, const QString& fieldName, int fldId,
@@ -97,16 +107,11 @@ BarcodeBatch collectBarcodes(const QString& folder, const QString& fieldName, in
         jet::fail(jet::err::kItemNotFound,
                   QStringLiteral("The label query has no column %1").arg(fieldName));
 
-    const BarTypeMapping mapping = mapBarType(barDef.BarType);
-    barDef.BarType = qint16(mapping.libraryCode);
-    if (mapping.fullAscii) barDef.C39Ascii = true;
-    batch.barDef = barDef;
+    batch.barDef = mappedBarDef(barDef);
     for (; !rs.eof(); rs.moveNext()) {
         ++batch.records;
-        const QVariant value = rs.value(column);
-        if (value.isNull() || (value.typeId() == QMetaType::QString && value.toString().isEmpty()))
-            continue;
-        batch.bitmaps.push_back({BmpName(fldId, batch.records), encodedText(value, barDef)});
+        const QString text = barcodeText(rs.value(column), batch.barDef);
+        if (!text.isEmpty()) batch.bitmaps.push_back({BmpName(fldId, batch.records), text});
     }
     return batch;
 }

@@ -9,6 +9,7 @@
 namespace etq {
 
 class BarcodeImage;
+struct BarcodeVector;
 
 // "B", the field slot as at least two digits, the record number (1 = first record of the label
 // query) as at least five digits, ".BMP": B0400001.BMP for slot 4, record 1.
@@ -59,6 +60,15 @@ BarcodeRun writeBarcodes(const std::vector<BarcodeBatch>& batches, int threads =
 // Database failures throw jet::JetError.
 BarcodeRun MakeBarcodeImages(const QString& folder, const QString& fieldName, int fldId,
                              const QString& dbName, const QString& sql, LabelBarDef barDef);
+
+// The cell's copy of the barcode setting with the designer's bar type turned into the library's
+// code (and full ASCII for "CODE-39 Ascii"), as every barcode cell's symbols are made.
+LabelBarDef mappedBarDef(LabelBarDef barDef);
+
+// The same symbol as WriteBarcodeBitmap would write, as shapes for drawing (BarcodeVector), with
+// `barDef` already mapped. False when the library refuses; the reason is in instance.lastError().
+bool MakeBarcodeVector(const QString& text, LabelBarDef& barDef, BarcodeImage& instance,
+                       BarcodeVector& out);
 
 // Sets up the library instance from `barDef` for `text` and writes the bitmap `fileName`. A
 // narrow bar or ratio of 0 or less becomes 0.01 or 2.2, in barDef too. False when the library

@@ -62,6 +62,8 @@ const Key<DirectLabelDef> kPageKeys[] = {
     {u"MaxTextLen", &DirectLabelDef::MaxTextLen, u"0"},
     {u"LabTop", &DirectLabelDef::LabTop, u"0"},
     {u"LabBottom", &DirectLabelDef::LabBottom, u"0"},
+    {u"SheetBrand", &DirectLabelDef::SheetBrand, u""},
+    {u"SheetPart", &DirectLabelDef::SheetPart, u""},
 };
 
 template <class Part, size_t N>
@@ -86,57 +88,23 @@ std::optional<double> storedNumber(const QString& text) {
 
 // Whole numbers take the stored text as CInt does; out of the field's range leaves it.
 template <class Whole>
-void readWhole(const QString& text, Whole& value) {
+bool readWhole(const QString& text, Whole& value) {
     const std::optional<double> number = storedNumber(text);
-    if (!number) return;
+    if (!number) return false;
     const qint64 whole = vb::roundHalfEven(*number);
     if (whole < std::numeric_limits<Whole>::min() || whole > std::numeric_limits<Whole>::max())
-        return;
+        return false;
     value = Whole(whole);
-}
-
-QString storedText(bool value) {
-    return value ? QStringLiteral("-1") : QStringLiteral("0");
-}
-QString storedText(quint8 value) {
-    return QString::number(value);
-}
-QString storedText(qint16 value) {
-    return QString::number(value);
-}
-// Single-precision values keep the seven digits they hold: 0.01 is stored as "0.01".
-QString storedText(float value) {
-    return QString::number(double(value), 'g', 7);
-}
-QString storedText(const QString& value) {
-    if (value == u"True") return QStringLiteral("-1");
-    if (value == u"False") return QStringLiteral("0");
-    return value;
-}
-
-void readInto(const QString& text, bool& value) {
-    if (const std::optional<double> number = storedNumber(text)) value = *number != 0;
-}
-void readInto(const QString& text, quint8& value) {
-    readWhole(text, value);
-}
-void readInto(const QString& text, qint16& value) {
-    readWhole(text, value);
-}
-void readInto(const QString& text, float& value) {
-    if (const std::optional<double> number = storedNumber(text)) value = float(*number);
-}
-void readInto(const QString& text, QString& value) {
-    value = storedText(text);
+    return true;
 }
 
 template <class T>
 void moveValue(quint8 action, SettingsStore& store, const QString& section, const QString& key,
                T& value, const QString& defaultText) {
     if (action == SaveLabelDef) {
-        store.write(section, key, storedText(value));
+        store.write(section, key, labelValueText(value));
     } else if (action == LoadLabelDef) {
-        readInto(store.read(section, key, defaultText), value);
+        labelValueFromText(store.read(section, key, defaultText), value);
     }
 }
 
@@ -152,6 +120,52 @@ etq::LabelDefinition& etq::Context::labelDefinition() {
 }
 
 namespace etq {
+
+bool labelValueFromText(const QString& text, bool& value) {
+    const std::optional<double> number = storedNumber(text);
+    if (number) value = *number != 0;
+    return number.has_value();
+}
+bool labelValueFromText(const QString& text, quint8& value) {
+    return readWhole(text, value);
+}
+bool labelValueFromText(const QString& text, qint16& value) {
+    return readWhole(text, value);
+}
+bool labelValueFromText(const QString& text, float& value) {
+    const std::optional<double> number = storedNumber(text);
+    if (number) value = float(*number);
+    return number.has_value();
+}
+bool labelValueFromText(const QString& text, QString& value) {
+    value = labelValueText(text);
+    return true;
+}
+
+QString labelValueText(bool value) {
+    return value ? QStringLiteral("-1") : QStringLiteral("0");
+}
+QString labelValueText(quint8 value) {
+    return QString::number(value);
+}
+QString labelValueText(qint16 value) {
+    return QString::number(value);
+}
+// Single-precision values keep the seven digits they hold: 0.01 is stored as "0.01".
+QString labelValueText(float value) {
+    return QString::number(double(value), 'g', 7);
+}
+QString labelValueText(const QString& value) {
+    if (value == u"True") return QStringLiteral("-1");
+    if (value == u"False") return QStringLiteral("0");
+    return value;
+}
+
+LabelDefinition& loadedLabelDefinition(Context& context) {
+    LabelDefinition& definition = context.labelDefinition();
+    if (!definition.loaded) GetSetLabelDef(LoadLabelDef, context.applicationName, definition);
+    return definition;
+}
 
 void GetSetLabelValue(quint8 action, SettingsStore& store, const QString& section,
                       const QString& key, bool& value, const QString& defaultText) {
@@ -184,6 +198,7 @@ void GetSetLabelDef(quint8 action, const QString& application, LabelDefinition& 
         moveSection(action, store, QStringLiteral("LabelBar"), definition.bar, kBarKeys);
     moveSection(action, store, QStringLiteral("DirectLabel"), definition.page, kPageKeys);
     store.sync();
+    if (action == SaveLabelDef || action == LoadLabelDef) definition.loaded = true;
 }
 
 }  // namespace etq

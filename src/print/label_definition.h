@@ -5,6 +5,7 @@
 
 namespace etq {
 
+class Context;
 class SettingsStore;
 
 // The built-in label: seven cells stacked in every label, one barcode setting shared by the
@@ -29,6 +30,8 @@ struct LabelCell {
     bool IsPrice = false;  // set when the page is written: FldID is a price slot
     qint16 Height = 0;     // points; 0 or less automatic
     bool Border = false;
+
+    bool operator==(const LabelCell&) const = default;
 };
 
 // The barcode setting of all barcode cells.
@@ -45,6 +48,8 @@ struct LabelBarDef {
     qint16 UserResoY = 0;
     bool CheckDigit = false;
     bool ShowDesc = false;
+
+    bool operator==(const LabelBarDef&) const = default;
 };
 
 // The page grid.
@@ -55,6 +60,12 @@ struct DirectLabelDef {
     qint16 MaxTextLen = 0;
     qint16 LabTop = 0;
     qint16 LabBottom = 0;
+    // The label sheet product chosen in the designer (label_sheets.h): the PDF places the labels
+    // where it has them. Empty: the grid divides the page.
+    QString SheetBrand;
+    QString SheetPart;
+
+    bool operator==(const DirectLabelDef&) const = default;
 };
 
 inline constexpr int kLabelCellCount = 7;
@@ -69,6 +80,10 @@ struct LabelDefinition {
     std::array<LabelCell, kLabelCellCount> cells;
     LabelBarDef bar;
     DirectLabelDef page;
+    // Set by the first load or save: the definition in memory is the user's from then on.
+    bool loaded = false;
+
+    bool operator==(const LabelDefinition&) const = default;
 };
 
 enum LabelDefAction : quint8 { SaveLabelDef = 1, LoadLabelDef = 2 };
@@ -78,6 +93,27 @@ enum LabelDefAction : quint8 { SaveLabelDef = 1, LoadLabelDef = 2 };
 // negative, then "DirectLabel". A value that does not convert to its field's type leaves the
 // field as it was; nothing is reported.
 void GetSetLabelDef(quint8 action, const QString& application, LabelDefinition& definition);
+
+// The run's definition, loaded from the store first unless this run has loaded (or saved) it
+// already: the designer's changes since then stay. Every use of the built-in label goes
+// through here, so a route chosen after start-up does not print an empty definition.
+LabelDefinition& loadedLabelDefinition(Context& context);
+
+// Takes a text into a field as a load does: numbers ("True" and "False" as -1 and 0), whole
+// fields rounded half to even; false, leaving the field as it was, when the text does not
+// convert or a whole number does not fit.
+bool labelValueFromText(const QString& text, bool& value);
+bool labelValueFromText(const QString& text, quint8& value);
+bool labelValueFromText(const QString& text, qint16& value);
+bool labelValueFromText(const QString& text, float& value);
+bool labelValueFromText(const QString& text, QString& value);
+// A field's value as a save writes it: booleans "-1" and "0", single-precision numbers with the
+// seven digits they hold (0.01 as "0.01"), "True" and "False" in a text as "-1" and "0".
+QString labelValueText(bool value);
+QString labelValueText(quint8 value);
+QString labelValueText(qint16 value);
+QString labelValueText(float value);
+QString labelValueText(const QString& value);
 
 // Moves one value. Writing stores the value as text, booleans as "-1" and "0". Reading takes
 // the stored text (or `defaultText`) into the field; "True" and "False" read as -1 and 0.

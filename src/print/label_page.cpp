@@ -15,14 +15,12 @@
 #include "platform/progress.h"
 #include "platform/user_paths.h"
 #include "print/barcode_images.h"
+#include "print/label_faces.h"
 #include "print/label_query.h"
 
 namespace etq {
 
 namespace {
-
-constexpr quint8 kTextCell = 0;
-constexpr quint8 kBarcodeCell = 1;
 
 // The style values of the designer's lists, by list index; an index outside a list writes
 // nothing after the property's name.
@@ -38,21 +36,6 @@ QString listEntry(const QStringView (&list)[N], int index) {
 
 [[noreturn]] void failWith(const QString& message) {
     throw std::runtime_error(message.toStdString());
-}
-
-// The field slot a cell in use shows.
-const LabelFieldSlot& slotOfCell(const LabelCell& cell, int cellIndex) {
-    if (cell.FldID < 0 || cell.FldID >= kLabelFieldCount)
-        failWith(QStringLiteral("Cell %1 of the label shows field %2, and there is no such field")
-                     .arg(cellIndex)
-                     .arg(cell.FldID));
-    return labelFieldSlots()[size_t(cell.FldID)];
-}
-
-// Whole copies of a record; Null counts 0.
-qint32 copiesOf(const QVariant& value) {
-    if (value.isNull()) return 0;
-    return vb::toLong(value).value_or(0);
 }
 
 QString styleLine(int i, const LabelCell& cell) {
@@ -96,24 +79,6 @@ void writeHead(PageFile& page, const LabelDefinition& def) {
     page.writeLine(u" BGCOLOR='#FFFFFF'>");
 }
 
-// Gives every cell in use its query column and price flag, and ticks its field so that the query
-// selects the column.
-void prepareCells(LabelQueryInput& query, LabelDefinition& def) {
-    for (int i = 0; i < kLabelCellCount; ++i) {
-        LabelCell& cell = def.cells[size_t(i)];
-        if (!cell.UseCell) continue;
-        const LabelFieldSlot& slot = slotOfCell(cell, i);
-        cell.FieldName = slot.column.toString();
-        cell.IsPrice = fieldFormat(slot.formatTag) == FieldFormat::Price;
-        query.fieldChecks[size_t(cell.FldID)] = true;
-    }
-}
-
-QString priceFormatOf(const QString& given) {
-    const QString format = given.trimmed();
-    return format.isEmpty() ? QStringLiteral("0.00") : format;
-}
-
 // "00.0" of a share of the page: 6 rows give 16.7, 12 columns 08.3, 1 row 100.0.
 QString percentOf(qint16 parts) {
     return vb::format(100.0 / parts, QStringLiteral("00.0")) + QStringLiteral("%'");
@@ -123,8 +88,8 @@ QString percentOf(qint16 parts) {
 class LabelWriter {
   public:
     LabelWriter(const QString& priceFormat, const LabelDefinition& def, PageFile& page,
-                Progress& progress)
-        : progress_(progress), def_(def), page_(page), priceFormat_(priceFormatOf(priceFormat)) {
+                Progress& progress, jet::Recordset& rs)
+        : progress_(progress), def_(def), page_(page), records_(rs, def, priceFormat) {
         imageAttributes_ = QStringLiteral(" ");
         if (def.bar.UserResoX > 0)
             imageAttributes_ += QStringLiteral(" width=") + QString::number(def.bar.UserResoX);
@@ -135,63 +100,37 @@ class LabelWriter {
                        QStringLiteral(" align='center'>");
     }
 
-    void write(jet::Recordset& rs) {
-        findColumns(rs);
-        qint64 total = 0;
-        for (; !rs.eof(); rs.moveNext())
-            total += std::max(0, copiesOf(rs.value(copiesColumn_)));
+    void write() {
+        const qint64 total = records_.totalCopies();
         const qint64 perSheet = qint64(def_.page.PageRows) * def_.page.PageCols;
         const qint64 sheets = (total + perSheet - 1) / perSheet;
 
         progress_.clear();
-        rs.moveFirst();
-        recordNo_ = 1;
-        enterRecord(rs);
+        records_.start();
         for (qint64 sheet = 1; sheet <= sheets; ++sheet) {
-            writeSheet(rs);
-            if (recordNo_ % 5 == 0) progress_.show(recordNo_, total);
+            writeSheet();
+            if (records_.recordNo() % 5 == 0) progress_.show(records_.recordNo(), total);
         }
     }
 
   private:
-    void findColumns(const jet::Recordset& rs) {
-        copiesColumn_ = columnOf(rs, QStringLiteral("Copies"));
-        for (int i = 0; i < kLabelCellCount; ++i) {
-            const LabelCell& cell = def_.cells[size_t(i)];
-            if (!cell.UseCell || cell.ViewType != kTextCell) continue;
-            columns_[size_t(i)] = columnOf(rs, cell.FieldName);
-            if (cell.IsPrice) signColumn_ = columnOf(rs, QStringLiteral("CoinSign"));
-        }
-    }
-
-    static int columnOf(const jet::Recordset& rs, const QString& name) {
-        const int column = rs.fieldIndex(name);
-        if (column < 0) failWith(QStringLiteral("The label query has no column %1").arg(name));
-        return column;
-    }
-
-    void writeSheet(jet::Recordset& rs) {
+    void writeSheet() {
         page_.writeLine(u"<table height='100%' width='100%' border='0'>");
         for (int row = 0; row < def_.page.PageRows; ++row) {
             page_.writeLine(u"  <tr>");
             for (int column = 0; column < def_.page.PageCols; ++column)
-                writeLabel(rs);
+                writeLabel(records_.next());
             page_.writeLine(u"  </tr>");
         }
         page_.writeLine(u"</table>");
     }
 
-    void writeLabel(jet::Recordset& rs) {
+    void writeLabel(const LabelFace* face) {
         page_.writeLine(cellOpening_);
         page_.writeLine(u"     <table class=Lab border='0'>");
-        if (!rs.eof()) {
-            for (const QString& line : recordRows_)
+        if (face) {
+            for (const QString& line : rowsOf(*face))
                 page_.writeLine(line);
-            if (++copy_ >= copies_) {
-                rs.moveNext();
-                ++recordNo_;
-                enterRecord(rs);
-            }
         } else {
             page_.writeLine(u"    <tr><td nowrap>&nbsp;</td></tr>");
         }
@@ -199,60 +138,36 @@ class LabelWriter {
         page_.writeLine(u"    </td>");
     }
 
-    // Makes the current record the next one that has copies to print; a record without
-    // copies takes no position but keeps its record number, as its bitmaps do.
-    void enterRecord(jet::Recordset& rs) {
-        copy_ = 0;
-        for (; !rs.eof(); rs.moveNext(), ++recordNo_) {
-            copies_ = copiesOf(rs.value(copiesColumn_));
-            if (copies_ > 0) break;
-        }
-        recordRows_.clear();
-        if (rs.eof()) return;
+    // A record's rows, made once for all its copies.
+    const QStringList& rowsOf(const LabelFace& face) {
+        if (face.recordNo == rowsRecord_) return rows_;
+        rowsRecord_ = face.recordNo;
+        rows_.clear();
         for (int i = 0; i < kLabelCellCount; ++i) {
             const LabelCell& cell = def_.cells[size_t(i)];
             if (!cell.UseCell) continue;
             if (cell.ViewType == kBarcodeCell) {
-                recordRows_.append(QStringLiteral("    <tr align='center'><td class='L") +
-                                   QString::number(i) + QStringLiteral("'><img src='") +
-                                   BmpName(cell.FldID, recordNo_) + u'\'' + imageAttributes_ +
-                                   QStringLiteral("></img></td></tr>"));
+                rows_.append(QStringLiteral("    <tr align='center'><td class='L") +
+                             QString::number(i) + QStringLiteral("'><img src='") +
+                             BmpName(cell.FldID, face.recordNo) + u'\'' + imageAttributes_ +
+                             QStringLiteral("></img></td></tr>"));
             } else if (cell.ViewType == kTextCell) {
-                recordRows_.append(QStringLiteral("    <tr align='center'><td class='L") +
-                                   QString::number(i) + QStringLiteral("'>") +
-                                   htmlEscaped(cellText(rs, i)) + QStringLiteral("</td></tr>"));
+                rows_.append(QStringLiteral("    <tr align='center'><td class='L") +
+                             QString::number(i) + QStringLiteral("'>") +
+                             htmlEscaped(face.texts[size_t(i)]) + QStringLiteral("</td></tr>"));
             }
         }
-    }
-
-    QString cellText(const jet::Recordset& rs, int i) const {
-        const LabelCell& cell = def_.cells[size_t(i)];
-        const QVariant value = rs.value(columns_[size_t(i)]);
-        QString text;
-        if (!value.isNull()) {
-            text = cell.IsPrice
-                       ? vb::format(value, priceFormat_) + u' ' + vb::toText(rs.value(signColumn_))
-                       : vb::toText(value);
-        }
-        if (!cell.Prefix.isEmpty()) text = cell.Prefix + u' ' + text;
-        if (def_.page.MaxTextLen > 0 && text.size() > def_.page.MaxTextLen)
-            text.truncate(def_.page.MaxTextLen);
-        return text;
+        return rows_;
     }
 
     Progress& progress_;
     const LabelDefinition& def_;
     PageFile& page_;
-    QString priceFormat_;
+    LabelRecords records_;
     QString imageAttributes_;
     QString cellOpening_;
-    int copiesColumn_ = -1;
-    int signColumn_ = -1;
-    std::array<int, kLabelCellCount> columns_{};
-    qint32 recordNo_ = 1;
-    qint32 copy_ = 0;
-    qint32 copies_ = 0;
-    QStringList recordRows_;
+    qint32 rowsRecord_ = 0;
+    QStringList rows_;
 };
 
 }  // namespace
@@ -273,7 +188,7 @@ void requirePrintableGrid(const DirectLabelDef& page) {
 void writeLabelPage(const QString& fileName, const QString& dbName, LabelPageInput& input,
                     LabelDefinition& def, Progress& progress) {
     requirePrintableGrid(def.page);
-    prepareCells(input.query, def);
+    prepareCells(input.query.fieldChecks, def);
     if (QFile::exists(fileName) && !QFile::remove(fileName))
         failWith(QStringLiteral("Cannot delete %1").arg(fileName));
     PageFile page;
@@ -286,7 +201,7 @@ void writeLabelPage(const QString& fileName, const QString& dbName, LabelPageInp
         page.close();
         return;
     }
-    LabelWriter(input.priceFormat, def, page, progress).write(rs);
+    LabelWriter(input.priceFormat, def, page, progress, rs).write();
     page.writeLine(u"</BODY>");
     page.writeLine(u"</HTML>");
     page.close();
@@ -296,7 +211,9 @@ void writeLabelPage(const QString& fileName, const QString& dbName, LabelPageInp
 BuiltInPrint printBuiltInLabels(const QString& dbName, LabelPageInput& input, LabelDefinition& def,
                                 Progress& progress) {
     requirePrintableGrid(def.page);
-    // Built before the page ticks the cells' fields, as the page's own query is later.
+    // The cells' fields are ticked first, so that the barcodes' query has every column the
+    // cells show, as the page's own query has.
+    prepareCells(input.query.fieldChecks, def);
     const QString sql = BuildLabelQuery(input.query);
     const PrintRunFolder run;
     const QString folder = run.path();
@@ -308,8 +225,8 @@ BuiltInPrint printBuiltInLabels(const QString& dbName, LabelPageInput& input, La
         for (int i = 0; i < kLabelCellCount; ++i) {
             const LabelCell& cell = def.cells[size_t(i)];
             if (cell.ViewType != kBarcodeCell || !cell.UseCell || cell.FldID < 0) continue;
-            batches.push_back(collectBarcodes(folder, slotOfCell(cell, i).column.toString(),
-                                              cell.FldID, dbName, sql, def.bar));
+            batches.push_back(
+                collectBarcodes(folder, cell.FieldName, cell.FldID, dbName, sql, def.bar));
         }
     }
     // The bitmaps are written beside the page while it is written; both are done before the

@@ -40,8 +40,9 @@ struct BuiltInPrint {
     QStringList refusedBarcodes;
 };
 
-// The whole built-in print run: empties the print folder, makes the barcode bitmaps of every
-// barcode cell and writes the page. Showing the page is the caller's. Throws on any failure.
+// The whole built-in print run: ticks the cells' fields (so that its queries have every column
+// the cells show), makes the barcode bitmaps of every barcode cell in a print folder of its own
+// and writes the page. Showing the page is the caller's. Throws on any failure.
 BuiltInPrint printBuiltInLabels(const QString& dbName, LabelPageInput& input,
                                 LabelDefinition& definition, Progress& progress);
 

@@ -7,6 +7,7 @@
 #include "platform/context.h"
 #include "platform/failure.h"
 #include "platform/printers.h"
+#include "print/label_definition.h"
 
 namespace etq {
 
@@ -31,7 +32,7 @@ BuiltInPrint printItemLabels(ItemPrintOptions& options, Context& context, Progre
 
 BuiltInPrint printLabels(ItemPrintOptions& options, Context& context, Progress& progress) {
     const QString workDb = prepareItemPrint(options);
-    return printBuiltInLabels(workDb, options.page, context.labelDefinition(), progress);
+    return printBuiltInLabels(workDb, options.page, loadedLabelDefinition(context), progress);
 }
 
 }  // namespace etq

@@ -29,8 +29,8 @@ struct ItemPrintOptions {
 QString prepareItemPrint(const ItemPrintOptions& options);
 
 // Labels for the marked items: prepareItemPrint, then the built-in print on the context's label
-// definition. Returns what the run made; options.page.query.fieldChecks comes back with the
-// cells' fields ticked. Throws on any failure.
+// definition (loaded first when the run has not yet). Returns what the run made;
+// options.page.query.fieldChecks comes back with the cells' fields ticked. Throws on any failure.
 BuiltInPrint printItemLabels(ItemPrintOptions& options, Context& context, Progress& progress);
 
 // Labels of the query type the options give: prepareItemPrint, then the built-in print on the

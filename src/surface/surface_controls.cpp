@@ -94,6 +94,9 @@ constexpr ControlSpec kControls[] = {
     {u"lblPrinter", -1, K::Label, 3, u"", u"מדפסת למדבקות ישירות:", u"Printer for direct labels:",
      u"", 0, 0},
     {u"cmbPrinter", -1, K::ComboBox, 3, u"", u"", u"", u"", 0, 1},
+    // How the built-in labels reach the printer: the page in the browser, or a PDF drawn here
+    // and sent to the printer.
+    {u"cmbPrintMode", -1, K::ComboBox, 3, u"", u"", u"", u"דף בדפדפן או הדפסה ישירה למדפסת", 0, 2},
     {u"cmdAlterKeys", -1, K::CommandButton, 3, u"", u"פריטים חלופיים", u"Alternate Items", u"", 1,
      1},
     {u"cmdAccDef", -1, K::CommandButton, 3, u"", u"הגדרות לקוח/ספק", u"Customer Definitions", u"",
@@ -216,6 +219,7 @@ constexpr DesignList kDesignLists[] = {
     {u"cmbAddressSeperator", u"0;,"},
     {u"cmbCopiesAt", u"כמות בשורה;עותק אחד לשורה"},
     {u"cmbLine0From", u"כל השורות;שורה ראשונה בלבד"},
+    {u"cmbPrintMode", u"דף בדפדפן;הדפסה ישירה"},
 };
 
 }  // namespace

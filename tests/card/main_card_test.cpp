@@ -35,7 +35,7 @@ const struct {
      "txtFromDate txtToDate LblFromDate LblToDate txtFromDocNum txtToDocNum LblToRef chkReadDocItems chkPrintHeadLabel chkOnlyLine0 chkUseFastWay cmdImportDocs Image6 cmdSelectDocItems Image7 cmdPrintDocButt Image8 cmdRanges cmdDLog cmdSaveDef5"},
     {2,
      "txtFromItemKey txtToItemKey chkItmQGrp cmbItmQGrp cmbItmQGrpBy chkItmBelong cmbItmBelong chkReadPriceList ChkClean ChkImportAlterPrices txtCopies cmbPriceField CmbItemNameType CmdImportItems cmdSaveDef2"},
-    {3, "cmbPrinter cmdAlterKeys cmdAccDef cmdEditItems"},
+    {3, "cmbPrinter cmbPrintMode cmdAlterKeys cmdAccDef cmdEditItems"},
     {4,
      "txtCompanyName txtDBPath DDEorOLE OptOLE(0) OptOLE(1) OptOLE(2) OptOLE(3) OptOLE(4) OptOLE(5) PrinterType OptPrinter(0) OptPrinter(1) txtLabelSoftware CmdDir(2) txtLabelName CmdDir(1) ImgEdit(1) txtLabelNameHead CmdDir(0) ImgEdit(0) cmdLabDesign CmdConnect cmdSaveDef1"},
     {5, "txtPrintDelay txtPriceFormat CmdSaveFields"},
@@ -114,7 +114,7 @@ TEST_F(MainCardTest, ControlsCarryTheirDesignCaptionsTagsAndTooltips) {
     EXPECT_EQ(widget<QLabel>("LblFldName(2)")->property("Tag").toString(), "");
     EXPECT_EQ(widget<QLabel>("LblFldName(16)")->text(), "-");
     EXPECT_EQ(widget<QLabel>("LblFldDesc(6)")->text(), "מחיר");
-    EXPECT_EQ(widget<QLabel>("LblFldDesc(5)")->property("Tag").toString(), "Local");
+    EXPECT_EQ(widget<QLabel>("LblFldDesc(5)")->property("Tag").toString(), "Unit");
     EXPECT_EQ(widget<QLabel>("LblFldDesc(11)")->property("Tag").toString(), "SpecialPrice");
     EXPECT_EQ(widget<QCheckBox>("ChkFldSend(0)")->toolTip(), "Item code");
     EXPECT_EQ(widget<QCheckBox>("ChkFldSend(40)")->toolTip(), "");

@@ -7,6 +7,7 @@
 #include <QProcess>
 #include <QTemporaryDir>
 #include <QtEndian>
+#include <cmath>
 
 namespace etq {
 namespace {
@@ -245,6 +246,48 @@ TEST_F(BarcodeImageTest, OneInstanceForManyBitmapsWritesWhatFreshInstancesWrite)
         EXPECT_EQ(shared.lastError(), freshError) << n;
         EXPECT_EQ(contents(sharedFile), contents(freshFile)) << n;
     }
+}
+
+// The same symbols as shapes: a module is DimX inches and the bars BarHeight inches, whatever
+// the resolution; the refusals are the bitmap's.
+TEST_F(BarcodeImageTest, VectorsAreTheSymbolInMillimetres) {
+    const struct {
+        Barcode barcode;
+        int modules;  // across, with EAN's room for its first digit
+        double bars;  // the bars' height, mm
+        int texts;
+    } cases[] = {
+        {{.barType = bt::Ean13, .text = "729000000590", .showDesc = true}, 113, 10.16, 3},
+        {{.barType = bt::Code128, .text = "ABC123", .dimX = 0.02f, .barHeight = 0.5f, .resoY = 90},
+         101,
+         12.7,
+         0},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.barcode.text.toStdString());
+        BarcodeImage image;
+        configure(image, c.barcode);
+        BarcodeVector vector;
+        ASSERT_TRUE(image.OutputVector(vector)) << image.lastError().toStdString();
+        const double module = c.barcode.dimX * 25.4;
+        EXPECT_NEAR(vector.size.width(), c.modules * module, 1e-3);
+        double tallest = 0;
+        for (const QRectF& bar : vector.bars) {
+            EXPECT_GE(bar.left(), 0);
+            EXPECT_LE(bar.right(), vector.size.width() + 1e-6);
+            EXPECT_NEAR(std::fmod(bar.width() / module + 1e-6, 1.0), 0, 1e-3);  // whole modules
+            tallest = std::max(tallest, bar.height());
+        }
+        EXPECT_GE(tallest, c.bars - 1e-3);
+        EXPECT_EQ(int(vector.texts.size()), c.texts);
+    }
+
+    BarcodeImage image;
+    configure(image, {.barType = bt::Ean13, .text = "ABC"});
+    BarcodeVector vector;
+    EXPECT_FALSE(image.OutputVector(vector));
+    EXPECT_EQ(image.lastError(), "EAN-13 takes digits only (data \"ABC\")");
+    EXPECT_TRUE(vector.bars.empty());
 }
 
 }  // namespace

@@ -16,15 +16,13 @@
 #include "support/qt_print.h"
 #include "support/test_env.h"
 
+#include "demo_fixture.h"
+
 namespace etq::print::test {
 namespace {
 
 using etq::test::ProcessResult;
 using etq::test::runProcess;
-
-QString lastLine(const QString& text) {
-    return text.trimmed().split(u'\n').last().trimmed();
-}
 
 // What the browser saw once the page had loaded: the labels that hold a record, and each
 // image's source with its natural width (0 when it did not load).
@@ -79,40 +77,10 @@ Rendered renderInChromium(const QString& page) {
     return rendered;
 }
 
-QString decode(const QString& bitmap) {
-    return runProcess("zbarimg", {"-q", "--raw", bitmap}).out.trimmed();
-}
-
-class DemoPageTest : public ::testing::Test {
-  protected:
-    void SetUp() override {
-        env = QProcessEnvironment::systemEnvironment();
-        env.remove("DISPLAY");  // print only; never open a browser from a test
-        env.remove("WAYLAND_DISPLAY");
-        env.insert("ETIQUON_BUILD_DIR", ETIQUON_BUILD_DIR);
-        env.insert("ETIQUON_DEMO_DIR", work.path());
-    }
-    ProcessResult cli(const QStringList& args) {
-        return runProcess(QString(ETIQUON_BUILD_DIR) + "/src/app/etiquon-cli",
-                          QStringList{"--setting-id", "90"} + args, env);
-    }
-    // The barcodes of the marked items, in item key order.
-    QStringList marked(const char* column) {
-        jet::Database items = jet::Database::open(work.path() + "/db/etqnitm.kdb");
-        QStringList values;
-        jet::Recordset rs = items.openRecordset(
-            QString("SELECT %1 FROM tItems WHERE PrintLabel = True ORDER BY ItemKey").arg(column));
-        for (; !rs.eof(); rs.moveNext())
-            values << rs.value(0).toString();
-        return values;
-    }
-    QTemporaryDir work;
-    QProcessEnvironment env;
-};
+using DemoPageTest = DemoTest;
 
 TEST_F(DemoPageTest, BrowserShowsEveryLabelAndBarcodeOfTheDemoPage) {
-    const ProcessResult demo =
-        runProcess("bash", {etq::test::sourceDir() + "/tools/demo.sh", "--no-build"}, env);
+    const ProcessResult demo = runDemo();
     ASSERT_EQ(demo.exitCode, 0) << demo.err.toStdString();
     const QString line = lastLine(demo.out);
     ASSERT_TRUE(line.startsWith("The label page: ")) << line.toStdString();
@@ -139,9 +107,7 @@ TEST_F(DemoPageTest, BrowserShowsEveryLabelAndBarcodeOfTheDemoPage) {
 }
 
 TEST_F(DemoPageTest, Code128BitmapsReadBackAsTheItemKeys) {
-    ASSERT_EQ(
-        runProcess("bash", {etq::test::sourceDir() + "/tools/demo.sh", "--no-build"}, env).exitCode,
-        0);
+    ASSERT_EQ(runDemo().exitCode, 0);
     ASSERT_EQ(cli({"config", "set", "LabelBar", "BarType", "2"}).exitCode, 0);  // CODE-128
     ASSERT_EQ(cli({"config", "set", "1LabelDef", "FldID", "0"}).exitCode, 0);   // ItemKey
     const ProcessResult print = cli({"print-items", "--db", work.path() + "/db"});

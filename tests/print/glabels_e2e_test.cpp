@@ -169,7 +169,7 @@ TEST_F(GLabelsCliTest, LabelsGoToThePrinterAndStayInThePrintFolder) {
     EXPECT_TRUE(kept.contains("/etiquon/etiqon/run-")) << kept.toStdString();
     r = cli({"print-items", "--db", db()});
     ASSERT_EQ(r.exitCode, 0) << r.err.toStdString();
-    EXPECT_EQ(lp.runs(), (QStringList{"-d Office_HP " + kept, r.out.trimmed()}));
+    EXPECT_EQ(lp.runs(), (QStringList{"-d Office_HP -- " + kept, "-- " + r.out.trimmed()}));
 
     lp.program("echo 'lp: Error - No default destination.' >&2\nexit 1\n");
     r = cli({"print-items", "--db", db()});
@@ -245,8 +245,8 @@ TEST_F(GLabelsRouteTest, HeadLabelsPrintBeforeEachDocumentsLines) {
     } expected[] = {{"5001", 1}, {"5001", 3}, {"5002", 1}, {"5002", 2}};
     for (int i = 0; i < 4; ++i) {
         SCOPED_TRACE(i);
-        ASSERT_TRUE(runs[i].startsWith("-d Zebra /"));
-        const QString pdf = runs[i].mid(QString("-d Zebra ").size());
+        ASSERT_TRUE(runs[i].startsWith("-d Zebra -- /"));
+        const QString pdf = runs[i].mid(QString("-d Zebra -- ").size());
         EXPECT_EQ(plainText(pdf).count(expected[i].reference), expected[i].labels);
         EXPECT_EQ(labelBarcodes(pdf, dir.path()).size(), expected[i].labels);
     }

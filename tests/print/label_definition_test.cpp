@@ -85,7 +85,7 @@ TEST_F(LabelDefinitionTest, SavedDefinitionLoadsBackUnchanged) {
     def.bar.LeftPrefix = "X";
     def.bar.LeftLen = 3;
     def.bar.DimX = 0.015f;
-    def.page = {8, 3, true, 20, 2, 1};
+    def.page = {8, 3, true, 20, 2, 1, "Avery", "L7160"};
     GetSetLabelDef(SaveLabelDef, "Etiquon", def);
     LabelDefinition loaded;
     GetSetLabelDef(LoadLabelDef, "Etiquon", loaded);
@@ -107,6 +107,7 @@ TEST_F(LabelDefinitionTest, SavedDefinitionLoadsBackUnchanged) {
     EXPECT_EQ(loaded.page.PageCols, 3);
     EXPECT_TRUE(loaded.page.PageAutoPrint);
     EXPECT_EQ(loaded.page.MaxTextLen, 20);
+    EXPECT_EQ(loaded.page.SheetBrand + " " + loaded.page.SheetPart, "Avery L7160");
 }
 
 TEST_F(LabelDefinitionTest, NegativeBarTypeSkipsTheBarSectionFromThenOn) {

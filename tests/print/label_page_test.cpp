@@ -236,20 +236,26 @@ TEST_F(PrintRunTest, RefusedBarcodesAreReportedAndThePageStillShown) {
     EXPECT_EQ(viewer.shown.size(), 1);
 }
 
-TEST_F(PrintRunTest, BarcodeOnAnUntickedFieldFailsUntilTheBoxIsTicked) {
+// A cell may show a field whose box on the label data tab is not ticked: the run's barcode query
+// has the column from the first run on, and the box is ticked after it.
+TEST_F(PrintRunTest, BarcodeOnAnUntickedFieldPrintsFromTheFirstRun) {
     addItems({{"A", "סבון", "7290000000015"}});
     useCell(0, 8, 1);  // serial number: a column only when its box is ticked
-    for (int run = 0; run < 2; ++run) {
-        EXPECT_TRUE(PrintBuiltInLabels(surface, context, workDb(), ItemLabels).isEmpty());
-        ASSERT_EQ(messages.shown.size(), run + 1);
-        EXPECT_EQ(messages.shown.last().title, "תקלה");
-        EXPECT_EQ(messages.shown.last().icon, MsgIcon::Critical);
-        EXPECT_TRUE(messages.shown.last().text.contains("SerialNum"));
-    }
-    EXPECT_TRUE(viewer.shown.isEmpty());
-    surface.control("ChkFldSend", 8).setValue(1);
     def.bar.BarType = 2;
-    EXPECT_FALSE(PrintBuiltInLabels(surface, context, workDb(), ItemLabels).isEmpty());
+    const QString page = PrintBuiltInLabels(surface, context, workDb(), ItemLabels);
+    ASSERT_FALSE(page.isEmpty()) << messages.shown.value(0).text.toStdString();
+    EXPECT_TRUE(messages.shown.isEmpty());
+    EXPECT_TRUE(QFileInfo::exists(QFileInfo(page).path() + "/B0800001.BMP"));
+    EXPECT_EQ(surface.control("ChkFldSend", 8).value().toInt(), 1);
+}
+
+// The unit slot shows the item's unit, the column the item import fills.
+TEST_F(LabelPageTest, UnitCellShowsTheItemsUnit) {
+    addItems({{"A", "סבון", {}}});
+    jet::Database::open(path(db::kItemDatabaseFile))
+        .execute("UPDATE tItems SET Unit = 'ליטר', Local = 'x' WHERE ItemKey = 'A'");
+    useCell(0, 5);
+    EXPECT_EQ(positions(writePage())[0], QStringList{textRow(0, "ליטר")});
 }
 
 TEST_F(PrintRunTest, MissingDatabaseIsReported) {

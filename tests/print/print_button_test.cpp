@@ -52,6 +52,31 @@ TEST_F(PrintButtonTest, SaveGeneralSettingsKeepsTheDefinitionOnlyForTheBuiltInPa
     EXPECT_EQ(SettingsStore("Etiquon").read("DirectLabel", "PageRows", ""), "9");
 }
 
+// A run that chose another route at start-up loads the stored definition when the built-in
+// label is chosen, and before it prints; what the designer changed since stays.
+TEST_F(PrintButtonTest, TheDefinitionIsLoadedWhenTheRouteIsChosenAndBeforeAPrint) {
+    GetSetLabelDef(SaveLabelDef, context.applicationName, labelDefinition());  // cell 0: name
+    addItems({{"A", "סבון", {}}});
+    const auto printedCells = [&] {
+        QFile file(viewer.shown.value(viewer.shown.size() - 1));
+        return file.open(QIODevice::ReadOnly) ? file.readAll().count("<td class='L0'>") : -1;
+    };
+
+    labelDefinition() = LabelDefinition{};  // never loaded
+    controller.click("cmdPrintItmes");
+    EXPECT_EQ(printedCells(), 1);
+
+    labelDefinition() = LabelDefinition{};
+    surface.control("OptOLE", 3).setValue(true);
+    controller.click("OptOLE", 3);
+    EXPECT_TRUE(labelDefinition().cells[0].UseCell);
+    labelDefinition().cells[0].UseCell = false;  // the designer's change
+    controller.click("OptOLE", 3);
+    controller.click("cmdPrintItmes");
+    EXPECT_FALSE(labelDefinition().cells[0].UseCell);
+    EXPECT_EQ(printedCells(), 0);
+}
+
 TEST_F(PrintButtonTest, PrintButtonMakesTheWorkingDatabaseAndShowsThePage) {
     addItems({{"A", "סבון", {}}});
     ASSERT_TRUE(QFile::remove(workDb()));
