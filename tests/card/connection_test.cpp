@@ -23,13 +23,13 @@ class ConnectionTest : public ::testing::Test {
 
 TEST_F(ConnectionTest, ConnectionTextsByForm) {
     EXPECT_EQ(BuildConnString("srv", "sa", "pw", "corvan02", 1),
-              "driver={SQL Server};server=srv;uid=sa;pwd=pw;database=corvan02");
+              "Driver={FreeTDS};Server={srv,1433};UID=sa;Database=corvan02;PWD=pw");
     EXPECT_EQ(BuildConnString("srv", "sa", "pw", "corvan02", 2),
               "Provider=sqloledb;Data Source=srv;User Id=sa;Password=pw;Initial Catalog=corvan02");
     EXPECT_EQ(BuildConnString("srv", "sa", QString(), "db", 2),
               "Provider=sqloledb;Data Source=srv;User Id=sa;Password=;Initial Catalog=db");
     EXPECT_EQ(BuildConnString("srv", "sa", "%1", "db", 1),
-              "driver={SQL Server};server=srv;uid=sa;pwd=%1;database=db");
+              "Driver={FreeTDS};Server={srv,1433};UID=sa;Database=db;PWD=%1");
     EXPECT_EQ(BuildConnString("srv", "sa", "pw", "db", 0), "");
     EXPECT_EQ(BuildConnString("srv", "sa", "pw", "db", 4), "");
 }
