@@ -36,6 +36,11 @@ void BoundGridModel::reload() {
     endResetModel();
 }
 
+void BoundGridModel::showRows() {
+    beginResetModel();
+    endResetModel();
+}
+
 void BoundGridModel::setHeader(int column, const QString& text) {
     headers_[column] = text;
     Q_EMIT headerDataChanged(Qt::Horizontal, column, column);

@@ -41,6 +41,9 @@ class BoundGridModel : public QAbstractTableModel {
     QVariant cell(int row, int column) const;
     // Re-reads the rows after rows were added or deleted through the recordset.
     void reload();
+    // Shows the recordset's rows as they stand after rows were added or deleted through it,
+    // without reading them again (a row added to a source that selects none stays shown).
+    void showRows();
 
     // Column look, as the dialogs set it.
     void setHeader(int column, const QString& text);
