@@ -13,6 +13,8 @@ packages=(
     unixodbc-dev tdsodbc libsqliteodbc
     # tests and benchmarks: GoogleTest, and the independent tools the tests check against
     libgtest-dev sqlite3 zint zbar-tools python3 python3-dbfread
+    # printed grids read back from their PDF files
+    poppler-utils
     # dBASE files as other tools write them, for the reader's tests
     python3-dbf shapelib
     # fuzzing (tools/fuzz.sh): clang with libFuzzer's runtime, and a symbolizer for its reports

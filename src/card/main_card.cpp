@@ -17,6 +17,7 @@
 
 #include "card/card_controller.h"
 #include "card/component.h"
+#include "card/editor_commands.h"
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/logon_dialog.h"
 #include "dialogs/select_item_window.h"
@@ -224,6 +225,7 @@ MainCard::MainCard(Context& context, QWidget* parent)
     });
     connectDocTypeGrid();
     connectItemSelection();
+    connectEditors(*controller_, *this, this);
     connectParts(*controller_, *this);
 }
 

@@ -10,6 +10,7 @@
 
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/language_switch.h"
+#include "dialogs/window_controls.h"
 #include "platform/captions.h"
 #include "platform/failure.h"
 #include "platform/log.h"
@@ -49,23 +50,7 @@ constexpr int kRightCentred = 7;
 
 QPushButton* makeButton(QStringView name, QWidget* parent) {
     const Caption& c = captionOf(name);
-    auto* button = new QPushButton(c.hebrew.toString(), parent);
-    button->setObjectName(name.toString());
-    button->setProperty("Tag", c.english.toString());
-    return button;
-}
-
-QLineEdit* makeBox(const QString& name, QWidget* parent) {
-    auto* box = new QLineEdit(parent);
-    box->setObjectName(name);
-    return box;
-}
-
-QComboBox* makeList(const QString& name, const QString& items, QWidget* parent) {
-    auto* combo = new QComboBox(parent);
-    combo->setObjectName(name);
-    FillComboFromList(combo, items);
-    return combo;
+    return etq::makeButton(name.toString(), c.hebrew.toString(), c.english.toString(), parent);
 }
 
 }  // namespace
@@ -105,9 +90,9 @@ void SelectItemWindow::buildControls() {
 
     sortBy_ = makeList(QStringLiteral("cmbItmSortBy"), QStringLiteral("מפתח פריט;שם פריט"), this);
     sortOrder_ = makeList(QStringLiteral("cmbItmSortOrder"), QStringLiteral("עולה;יורד"), this);
-    auto* sortLabel = new QLabel(captionOf(u"lblSortBy").hebrew.toString(), this);
-    sortLabel->setObjectName(QStringLiteral("lblSortBy"));
-    sortLabel->setProperty("Tag", captionOf(u"lblSortBy").english.toString());
+    const Caption& sortCaption = captionOf(u"lblSortBy");
+    QLabel* sortLabel = makeLabel(QStringLiteral("lblSortBy"), sortCaption.hebrew.toString(),
+                                  sortCaption.english.toString(), this);
     allCopies_ = makeBox(QStringLiteral("txtAllCopis"), this);
     findKey_ = makeBox(QStringLiteral("txtToItemKey"), this);
     findName_ = makeBox(QStringLiteral("txtToItemName"), this);

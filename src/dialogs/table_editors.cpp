@@ -82,8 +82,4 @@ void AccountDefEditor::FillPriceListColumn(const ConnParams& params) {
     }
 }
 
-void AccountDefEditor::setLabelFile(int row, const QString& file) {
-    if (!file.isEmpty()) write(row, kLabelColumn, file);
-}
-
 }  // namespace etq

@@ -90,9 +90,6 @@ class AccountDefEditor : public EditorGrid {
     void FillPriceListColumn(const ConnParams& params);
     const EntryList& priceLists() const { return priceLists_; }
 
-    // The cell of the row's label file takes `file`, unless it is empty (a cancelled dialog).
-    void setLabelFile(int row, const QString& file);
-
   private:
     EntryList priceLists_;
 };

@@ -11,6 +11,8 @@
 #include "import/connection.h"
 #include "platform/context.h"
 #include "platform/settings_store.h"
+#include "support/log_capture.h"
+#include "support/sql_source_file.h"
 
 namespace etq {
 namespace {
@@ -94,6 +96,29 @@ TEST_F(ConnectionTest, TheDialogChecksForTheAccountsFileAndSavesOnAccept) {
     EXPECT_EQ(readSetting("Etiquon", "Params", "ConnServer", ""), host.path() + "/");
     EXPECT_EQ(readSetting("Etiquon", "Params", "ConnDataBase", ""), "demo");
     EXPECT_FALSE(SettingsStore("Etiquon").contains("Params", "ConnUID"));
+}
+
+TEST_F(ConnectionTest, TheDialogTestsTheSqlServerSourceWithTheTypedTexts) {
+    QTemporaryDir dir;
+    test::writeSqlSourceFile(dir.filePath("host.db"));
+    context.connection = test::sqlSourceParams(dir.filePath("elsewhere.db"));
+    context.connection.database = "not used";
+    LogonDialog dialog(context);
+    auto* database = dialog.findChild<QLineEdit*>("txtConnDatabase");
+    auto* message = dialog.findChild<QLabel*>("LblMsg");
+    auto* check = dialog.findChild<QPushButton*>("CmdCheckSql");
+    ASSERT_TRUE(database && message && check);
+    database->setText(dir.filePath("host.db"));
+    check->click();
+    EXPECT_EQ(message->text(), "הבדיקה הסתיימה בהצלחה");
+
+    context.connection.driver = "No Such Driver";
+    test::LogCapture log;
+    check->click();
+    EXPECT_TRUE(message->text().startsWith("הבדיקה לא הסתיימה בהצלחה\n"));
+    EXPECT_TRUE(message->text().contains("No Such Driver"));
+    EXPECT_TRUE(log.contains("etiquon.import: SQL Server source test:"));
+    EXPECT_FALSE(SettingsStore("Etiquon").contains("Params", "ConnDataBase"));
 }
 
 }  // namespace

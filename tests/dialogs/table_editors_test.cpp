@@ -124,9 +124,8 @@ TEST_F(TableEditorsTest, AccountRowsAndTheirPriceListsAndLabelFiles) {
     editor.addRow();
     EXPECT_THROW(editor.addRow(), jet::JetError);
     EXPECT_EQ(editor.rowCount(), 1);
-    editor.setLabelFile(0, "");
     EXPECT_EQ(editor.value(0, 3).toString(), defaultLabelFile());
-    editor.setLabelFile(0, "/labels/shelf.lbl");
+    editor.write(0, 3, "/labels/shelf.lbl");
     editor.write(0, 2, 4);
     EXPECT_EQ(stored("SELECT AccountKey, PriceList, LabelName FROM tAccountDef"),
               QStringList{"00000000|4|/labels/shelf.lbl"});
