@@ -5,6 +5,7 @@
 #include <span>
 
 #include "app/cli_command.h"
+#include "app/cli_editors.h"
 #include "card/card_controller.h"
 #include "import/connection.h"
 #include "platform/context.h"
@@ -95,6 +96,19 @@ const Command kCommands[] = {
      "mark items for printing and set their copies", runMarkItems},
     {"print-items", "--db DIR [--open]", "print the marked items' labels; prints the page's path",
      runPrintItems},
+    {"items", kItemsUsage, "list the items of the item database, one a line, key first", runItems},
+    {"items", kItemsChangeUsage, "add an item, or change the given fields of one", runItems},
+    {"items", kItemsRemoveUsage, "delete items", runItems},
+    {"alt-keys", kAltKeysUsage, "list the alternate item keys and barcodes of accounts",
+     runAltKeys},
+    {"alt-keys", kAltKeysChangeUsage, "add an account's alternate key, or change one", runAltKeys},
+    {"alt-keys", kAltKeysRemoveUsage, "delete an account's alternate key", runAltKeys},
+    {"accounts", kAccountsUsage, "list the accounts' price lists and label files", runAccounts},
+    {"accounts", kAccountsChangeUsage, "add an account definition, or change one", runAccounts},
+    {"accounts", kAccountsRemoveUsage, "delete account definitions", runAccounts},
+    {"price-lists", kSourceListUsage, "list the price lists of the SQL Server source",
+     runPriceLists},
+    {"carriers", kSourceListUsage, "list the carriers of the SQL Server source", runCarriers},
 };
 
 void printHelp() {
