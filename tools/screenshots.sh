@@ -3,7 +3,7 @@
 # docs/screenshots/tab-0.png .. tab-7.png. Runs the window under a virtual X display.
 set -euo pipefail
 cd "$(dirname "$0")/.."
-tools/build.sh etiquon etiquon-cli document_database
+tools/build.sh etiquon etiquon-cli document_database make-demo-company editor-screenshots
 build="${ETIQUON_BUILD_DIR:-build}"
 out="${1:-docs/screenshots}"
 
@@ -17,3 +17,4 @@ export XDG_CONFIG_HOME="$scratch/config" XDG_RUNTIME_DIR="$scratch/runtime" XDG_
 "$build/src/app/etiquon-cli" init-db --db "$XDG_DATA_HOME/Etiquon" >/dev/null
 xvfb-run -a "$build/src/app/etiquon" --screenshots "$out"
 echo "screenshots: $(ls "$out"/tab-*.png | wc -l) pictures in $out"
+tools/editor-screenshots.sh "$out"

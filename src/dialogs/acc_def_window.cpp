@@ -66,11 +66,17 @@ class PriceListDelegate : public QStyledItemDelegate {
     const AccountDefEditor& editor_;
 };
 
-// The label column: the cell's text with an ellipsis button ("...") that chooses a file.
+// The label column: the cell's text with an ellipsis button ("...") that chooses a file. A path
+// reads left to right also in the right-to-left grid.
 class LabelFileDelegate : public QStyledItemDelegate {
   public:
     LabelFileDelegate(AccDefWindow& window, QObject* parent)
         : QStyledItemDelegate(parent), window_(window) {}
+
+    void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override {
+        QStyledItemDelegate::initStyleOption(option, index);
+        option->direction = Qt::LeftToRight;
+    }
 
     QWidget* createEditor(QWidget* parent, const QStyleOptionViewItem&,
                           const QModelIndex& index) const override {
@@ -78,6 +84,7 @@ class LabelFileDelegate : public QStyledItemDelegate {
         editor->setAutoFillBackground(true);
         auto* text = new QLineEdit(editor);
         text->setObjectName(QStringLiteral("LabelNameText"));
+        text->setLayoutDirection(Qt::LeftToRight);
         auto* ellipsis = new QToolButton(editor);
         ellipsis->setObjectName(QStringLiteral("LabelNameEllipsis"));
         ellipsis->setText(QStringLiteral("..."));

@@ -64,7 +64,7 @@ AlterItemsWindow::AlterItemsWindow(Context& context, const QString& databaseFold
     layout->addWidget(show, 1, 3, 3, 1);
     layout->addWidget(sortLabel, 3, 0);
     layout->addWidget(sortBy_, 3, 1);
-    layout->addWidget(sortOrder_, 3, 2);
+    layout->addWidget(sortOrder_, 3, 2, Qt::AlignLeading);
     layout->addWidget(setBar, 4, 0);
     layout->addWidget(altBarCode_, 4, 1, 1, 2);
     layout->addWidget(add, 5, 0);

@@ -49,7 +49,7 @@ class BoundGridModel : public QAbstractTableModel {
     void setHeader(int column, const QString& text);
     void setAlignment(int column, Qt::Alignment alignment);
     // The alignment the component's grids give a code: 7 right-centred, 1 left-centred,
-    // 4 centred.
+    // 4 centred; right and left as the eye sees them, also in a right-to-left grid.
     static Qt::Alignment alignmentOfCode(int code);
 
     // The last write the engine refused, for the window to show.

@@ -47,7 +47,7 @@ EditItemsWindow::EditItemsWindow(Context& context, const QString& databaseFolder
     layout->addWidget(show, 1, 3, 2, 1);
     layout->addWidget(sortLabel, 2, 0);
     layout->addWidget(sortBy_, 2, 1);
-    layout->addWidget(sortOrder_, 2, 2);
+    layout->addWidget(sortOrder_, 2, 2, Qt::AlignLeading);
     layout->addWidget(close, 3, 4);
     layout->setRowStretch(0, 1);
     layout->setColumnStretch(2, 1);

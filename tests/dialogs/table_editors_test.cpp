@@ -36,7 +36,7 @@ class TableEditorsTest : public db::test::DbFolderTest {
 
 TEST_F(TableEditorsTest, ItemSearchIsAValueAndSortsFollowTheLists) {
     EXPECT_EQ(
-        BuildEditItemsQuery({1, "12", 1, 1}),
+        BuildEditItemsQuery({1, "12", 1, 1, ""}),
         "SELECT ItemKey, ItemName, Unit, BarCode, Price FROM tItems Where (1>0) And ItemName Like '*12*' Order By ItemName DESC");
     ItemEditor editor(grid);
     editor.setDatabaseFolder(dir.path());
@@ -45,19 +45,19 @@ TEST_F(TableEditorsTest, ItemSearchIsAValueAndSortsFollowTheLists) {
         QStringList keys;
     };
     const Case cases[] = {
-        {{}, {"1", "2", "3", "4", "5", "6", "7", "8"}},
-        {{1, "12"}, {"1", "8"}},  // anywhere in the name
-        {{1, "*"}, {"2"}},
-        {{1, "A?B"}, {"3"}},
-        {{1, "#"}, {"7"}},
-        {{1, "["}, {"5"}},
-        {{1, "O'Neil"}, {"6"}},
-        {{1, "'; DROP TABLE tItems"}, {}},
-        {{2, "629"}, {"3"}},
-        {{0, "2"}, {"2"}},
-        {{-1, "12"}, {"1", "2", "3", "4", "5", "6", "7", "8"}},      // no search column: all
-        {{-1, "", 2, 1}, {"8", "7", "6", "4", "2", "1", "3", "5"}},  // barcode down, Null last
-        {{-1, "", 0, 1}, {"8", "7", "6", "5", "4", "3", "2", "1"}},
+        {{-1, "", -1, 0, ""}, {"1", "2", "3", "4", "5", "6", "7", "8"}},
+        {{1, "12", -1, 0, ""}, {"1", "8"}},  // anywhere in the name
+        {{1, "*", -1, 0, ""}, {"2"}},
+        {{1, "A?B", -1, 0, ""}, {"3"}},
+        {{1, "#", -1, 0, ""}, {"7"}},
+        {{1, "[", -1, 0, ""}, {"5"}},
+        {{1, "O'Neil", -1, 0, ""}, {"6"}},
+        {{1, "'; DROP TABLE tItems", -1, 0, ""}, {}},
+        {{2, "629", -1, 0, ""}, {"3"}},
+        {{0, "2", -1, 0, ""}, {"2"}},
+        {{-1, "12", -1, 0, ""}, {"1", "2", "3", "4", "5", "6", "7", "8"}},  // no column: all
+        {{-1, "", 2, 1, ""}, {"8", "7", "6", "4", "2", "1", "3", "5"}},  // barcode down, Null last
+        {{-1, "", 0, 1, ""}, {"8", "7", "6", "5", "4", "3", "2", "1"}},
         {{-1, "", -1, 0, "6"}, {"6"}},
     };
     for (const Case& c : cases) {
