@@ -167,6 +167,18 @@ void printGrid(EditorGrid& editor, RowFormat format) {
     printRows(columns, rows, format);
 }
 
+// Shows the editor's rows of the folder's item database, as `show` chooses them, and prints them.
+template <class Editor, class Show>
+int listRows(const QString& folder, RowFormat format, Show show) {
+    return runReporting([&] {
+        BoundGridModel grid;
+        Editor editor(grid);
+        editor.setDatabaseFolder(folder);
+        show(editor);
+        printGrid(editor, format);
+    });
+}
+
 // add, set or remove on one editor's table.
 int changeRows(const EditorTable& table, const QString& action, QStringList args) {
     const bool remove = action == u"remove";
@@ -243,13 +255,7 @@ int listItems(QStringList args, const CommonOptions& common) {
     filter.sortOrder = descending ? 1 : storedPosition(app, u"EditItems", u"ItmSortOrder");
     if ((!searchBy.isEmpty() && filter.searchBy < 0) || (!sortBy.isEmpty() && filter.sortBy < 0))
         return 2;
-    return runReporting([&] {
-        BoundGridModel grid;
-        ItemEditor editor(grid);
-        editor.setDatabaseFolder(folder);
-        editor.show(filter);
-        printGrid(editor, *format);
-    });
+    return listRows<ItemEditor>(folder, *format, [&](ItemEditor& e) { e.show(filter); });
 }
 
 int listAltKeys(QStringList args, const CommonOptions& common) {
@@ -274,13 +280,7 @@ int listAltKeys(QStringList args, const CommonOptions& common) {
                         : choice("--sort-by", sortBy, {"account", "item", "alt-num", "alt-bar"});
     if (!sortBy.isEmpty() && filter.sortBy < 0) return 2;
     filter.sortOrder = descending ? 1 : storedPosition(app, u"AlterItems", u"AltSortOrder");
-    return runReporting([&] {
-        BoundGridModel grid;
-        AlterKeyEditor editor(grid);
-        editor.setDatabaseFolder(folder);
-        editor.show(filter);
-        printGrid(editor, *format);
-    });
+    return listRows<AlterKeyEditor>(folder, *format, [&](AlterKeyEditor& e) { e.show(filter); });
 }
 
 int listAccounts(QStringList args) {
@@ -288,13 +288,7 @@ int listAccounts(QStringList args) {
     const std::optional<RowFormat> format = takeFormat(args);
     if (!format) return 2;
     if (folder.isEmpty() || !args.isEmpty()) return usage(kAccounts.command, kAccountsUsage);
-    return runReporting([&] {
-        BoundGridModel grid;
-        AccountDefEditor editor(grid);
-        editor.setDatabaseFolder(folder);
-        editor.show();
-        printGrid(editor, *format);
-    });
+    return listRows<AccountDefEditor>(folder, *format, [](AccountDefEditor& e) { e.show(); });
 }
 
 // A list of the SQL Server source under its two column names.

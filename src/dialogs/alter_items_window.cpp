@@ -19,8 +19,6 @@ namespace etq {
 namespace {
 const QString kColumns = QStringLiteral("קוד כרטיס;מפתח פריט;מפתח חליפי;בר-קוד חליפי");
 const QString kEnglishColumns = QStringLiteral("Card code;Item code;Alt.Code;Alt.Barcode");
-const QString kOrders = QStringLiteral("עולה;יורד");
-const QString kEnglishOrders = QStringLiteral("Up;Down");
 constexpr quint8 kSettingsGroup = 12;
 }  // namespace
 
@@ -29,7 +27,7 @@ AlterItemsWindow::AlterItemsWindow(Context& context, const QString& databaseFold
                    QStringLiteral("VSAlterKeys"), parent),
       editor_(grid()),
       sortBy_(makeList(QStringLiteral("cmbAltSortBy"), kColumns, this)),
-      sortOrder_(makeList(QStringLiteral("cmbAltSortOrder"), kOrders, this)),
+      sortOrder_(makeList(QStringLiteral("cmbAltSortOrder"), kSortOrderList, this)),
       altBarCode_(makeBox(QStringLiteral("txtAltBarCode"), this)) {
     for (int k = 0; k < 2; ++k) {
         searchBy_[k] = makeList(QStringLiteral("cmbAltSearchBy(%1)").arg(k), kColumns, this);
@@ -85,7 +83,7 @@ AlterItemsWindow::AlterItemsWindow(Context& context, const QString& databaseFold
         switchToEnglish(QStringLiteral("Alternate items"));
         for (QComboBox* list : {searchBy_[0], searchBy_[1], sortBy_})
             FillComboFromList(list, kEnglishColumns);
-        FillComboFromList(sortOrder_, kEnglishOrders);
+        FillComboFromList(sortOrder_, kEnglishSortOrderList);
     }
     loadSettings(kSettingsGroup);
     editor_.setDatabaseFolder(databaseFolder);

@@ -15,8 +15,6 @@ namespace etq {
 namespace {
 const QString kColumns = QStringLiteral("מפתח פריט;שם פריט;בר-קוד");
 const QString kEnglishColumns = QStringLiteral("Item code;Item name;Bar-code");
-const QString kOrders = QStringLiteral("עולה;יורד");
-const QString kEnglishOrders = QStringLiteral("Up;Down");
 constexpr int kPriceColumn = 5;
 constexpr quint8 kSettingsGroup = 11;
 }  // namespace
@@ -28,7 +26,7 @@ EditItemsWindow::EditItemsWindow(Context& context, const QString& databaseFolder
       searchBy_(makeList(QStringLiteral("cmbItmSearchBy"), kColumns, this)),
       searchValue_(makeBox(QStringLiteral("txtItmSearchValue"), this)),
       sortBy_(makeList(QStringLiteral("cmbItmSortBy"), kColumns, this)),
-      sortOrder_(makeList(QStringLiteral("cmbItmSortOrder"), kOrders, this)) {
+      sortOrder_(makeList(QStringLiteral("cmbItmSortOrder"), kSortOrderList, this)) {
     QLabel* searchLabel = makeLabel(QStringLiteral("lblItmSearchBy"), QStringLiteral("חיפוש לפי:"),
                                     QStringLiteral("Search by:"), this);
     QLabel* sortLabel = makeLabel(QStringLiteral("lblItmSortBy"), QStringLiteral("מיון לפי:"),
@@ -59,7 +57,7 @@ EditItemsWindow::EditItemsWindow(Context& context, const QString& databaseFolder
         switchToEnglish(QStringLiteral("Edit items"));
         FillComboFromList(searchBy_, kEnglishColumns);
         FillComboFromList(sortBy_, kEnglishColumns);
-        FillComboFromList(sortOrder_, kEnglishOrders);
+        FillComboFromList(sortOrder_, kEnglishSortOrderList);
     }
     loadSettings(kSettingsGroup);
     editor_.setDatabaseFolder(databaseFolder);

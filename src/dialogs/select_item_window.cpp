@@ -89,7 +89,7 @@ void SelectItemWindow::buildControls() {
     view_->setSelectionMode(QAbstractItemView::SingleSelection);
 
     sortBy_ = makeList(QStringLiteral("cmbItmSortBy"), QStringLiteral("מפתח פריט;שם פריט"), this);
-    sortOrder_ = makeList(QStringLiteral("cmbItmSortOrder"), QStringLiteral("עולה;יורד"), this);
+    sortOrder_ = makeList(QStringLiteral("cmbItmSortOrder"), kSortOrderList, this);
     const Caption& sortCaption = captionOf(u"lblSortBy");
     QLabel* sortLabel = makeLabel(QStringLiteral("lblSortBy"), sortCaption.hebrew.toString(),
                                   sortCaption.english.toString(), this);
@@ -145,7 +145,7 @@ void SelectItemWindow::switchToEnglish() {
     MirrorControls(this);
     ApplyTagCaptions(this);
     FillComboFromList(sortBy_, QStringLiteral("Item code;Item Name"));
-    FillComboFromList(sortOrder_, QStringLiteral("Up;Down"));
+    FillComboFromList(sortOrder_, kEnglishSortOrderList);
     findName_->setAlignment(Qt::AlignLeft | Qt::AlignAbsolute);
 }
 

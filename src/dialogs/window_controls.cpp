@@ -9,20 +9,23 @@
 
 namespace etq {
 
+namespace {
+template <class Control>
+Control* named(Control* control, const QString& name, const QString& english) {
+    control->setObjectName(name);
+    control->setProperty("Tag", english);
+    return control;
+}
+}  // namespace
+
 QPushButton* makeButton(const QString& name, const QString& hebrew, const QString& english,
                         QWidget* parent) {
-    auto* button = new QPushButton(hebrew, parent);
-    button->setObjectName(name);
-    button->setProperty("Tag", english);
-    return button;
+    return named(new QPushButton(hebrew, parent), name, english);
 }
 
 QLabel* makeLabel(const QString& name, const QString& hebrew, const QString& english,
                   QWidget* parent) {
-    auto* label = new QLabel(hebrew, parent);
-    label->setObjectName(name);
-    label->setProperty("Tag", english);
-    return label;
+    return named(new QLabel(hebrew, parent), name, english);
 }
 
 QLineEdit* makeBox(const QString& name, QWidget* parent) {

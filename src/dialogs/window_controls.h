@@ -13,6 +13,10 @@ class QWidget;
 // language_switch.h puts it in place in English mode).
 namespace etq {
 
+// The entries of the sort order lists (position 1 descending), in Hebrew and in English.
+inline const QString kSortOrderList = QStringLiteral("עולה;יורד");
+inline const QString kEnglishSortOrderList = QStringLiteral("Up;Down");
+
 QPushButton* makeButton(const QString& name, const QString& hebrew, const QString& english,
                         QWidget* parent);
 QLabel* makeLabel(const QString& name, const QString& hebrew, const QString& english,
