@@ -242,12 +242,20 @@ TEST_F(EditorWindowsTest, AccountWindowOffersPriceListsAndLabelFiles) {
 }
 
 TEST_F(EditorWindowsTest, AccountWindowWithoutTheSourceLogsAndKeepsPlainCells) {
-    context.connection.driver = "No Such Driver";
-    etq::test::LogCapture log;
-    OneFileChooser chooser;
-    AccDefWindow window(context, dir.path(), kNiceLabel, chooser);
-    EXPECT_TRUE(window.editor().priceLists().isEmpty());
-    EXPECT_TRUE(log.contains("No Such Driver"));
+    ConnParams wrongDriver;
+    wrongDriver.driver = "No Such Driver";
+    ConnParams unreachable;  // FreeTDS, and nothing listens on port 1
+    unreachable.server = "127.0.0.1,1";
+    for (const auto& [params, said] :
+         {std::pair{wrongDriver, "No Such Driver"}, {unreachable, "08001"}}) {
+        context.connection = params;
+        etq::test::LogCapture log;
+        OneFileChooser chooser;
+        AccDefWindow window(context, dir.path(), kNiceLabel, chooser);
+        EXPECT_TRUE(window.editor().priceLists().isEmpty());
+        EXPECT_TRUE(log.contains("price lists from the SQL Server source")) << said;
+        EXPECT_TRUE(log.contains(said)) << said;
+    }
     EXPECT_TRUE(messages.shown.isEmpty());
 }
 
