@@ -4,7 +4,7 @@
 # label (designer-0.png .. designer-2.png). Runs the window under a virtual X display.
 set -euo pipefail
 cd "$(dirname "$0")/.."
-tools/build.sh etiquon etiquon-cli document_database make-demo-company
+tools/build.sh etiquon etiquon-cli document_database make-demo-company editor-screenshots
 build="${ETIQUON_BUILD_DIR:-build}"
 out="${1:-docs/screenshots}"
 
@@ -23,4 +23,5 @@ CI=1 ETIQUON_DEMO_DIR="$scratch/demo" tools/demo.sh --no-build >/dev/null
 "$build/src/app/etiquon-cli" --setting-id 90 config set GeneralParams DBPath "$scratch/demo/db"
 xvfb-run -a "$build/src/app/etiquon" --setting-id 90 --screenshots "$scratch/demo-pictures"
 cp "$scratch"/demo-pictures/designer-*.png "$out"/
+tools/editor-screenshots.sh "$out"
 echo "screenshots: $(ls "$out"/*.png | wc -l) pictures in $out"

@@ -8,8 +8,13 @@ packages=(
     g++ cmake ninja-build pkg-config clang-format
     # libraries
     qt6-base-dev libgl-dev libsqlite3-dev libzint-dev zlib1g-dev
+    # the host's SQL Server database over ODBC: unixODBC's driver manager and FreeTDS's driver;
+    # SQLite's ODBC driver stands in for the server in the tests
+    unixodbc-dev tdsodbc libsqliteodbc
     # tests and benchmarks: GoogleTest, and the independent tools the tests check against
     libgtest-dev sqlite3 zint zbar-tools python3 python3-dbfread
+    # printed grids read back from their PDF files
+    poppler-utils
     # dBASE files as other tools write them, for the reader's tests
     python3-dbf shapelib
     # fuzzing (tools/fuzz.sh): clang with libFuzzer's runtime, and a symbolizer for its reports

@@ -10,6 +10,7 @@
 #include <span>
 
 #include "app/cli_command.h"
+#include "app/cli_editors.h"
 #include "card/card_controller.h"
 #include "import/connection.h"
 #include "platform/context.h"
@@ -136,6 +137,19 @@ const Command kCommands[] = {
     {"print-docs", "--db DIR [--open] [--output FILE] [--printer NAME] [--outlines]",
      "print the included document lines' labels; prints the page's (or the PDFs') paths",
      runPrintDocs},
+    {"items", kItemsUsage, "list the items of the item database, one a line, key first", runItems},
+    {"items", kItemsChangeUsage, "add an item, or change the given fields of one", runItems},
+    {"items", kItemsRemoveUsage, "delete items", runItems},
+    {"alt-keys", kAltKeysUsage, "list the alternate item keys and barcodes of accounts",
+     runAltKeys},
+    {"alt-keys", kAltKeysChangeUsage, "add an account's alternate key, or change one", runAltKeys},
+    {"alt-keys", kAltKeysRemoveUsage, "delete an account's alternate key", runAltKeys},
+    {"accounts", kAccountsUsage, "list the accounts' price lists and label files", runAccounts},
+    {"accounts", kAccountsChangeUsage, "add an account definition, or change one", runAccounts},
+    {"accounts", kAccountsRemoveUsage, "delete account definitions", runAccounts},
+    {"price-lists", kSourceListUsage, "list the price lists of the SQL Server source",
+     runPriceLists},
+    {"carriers", kSourceListUsage, "list the carriers of the SQL Server source", runCarriers},
 };
 
 void printHelp() {

@@ -17,6 +17,7 @@
 
 #include "card/card_controller.h"
 #include "card/component.h"
+#include "card/editor_commands.h"
 #include "card/print_adapters.h"
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/edit_ranges_window.h"
@@ -232,6 +233,7 @@ MainCard::MainCard(Context& context, QWidget* parent)
     connectItemSelection();
     connectDocumentWindows();
     connectLabelDesigner();
+    connectEditors(*controller_, *this, this);
     connectParts(*controller_, *this);
 }
 

@@ -36,6 +36,11 @@ void BoundGridModel::reload() {
     endResetModel();
 }
 
+void BoundGridModel::showRows() {
+    beginResetModel();
+    endResetModel();
+}
+
 void BoundGridModel::setHeader(int column, const QString& text) {
     headers_[column] = text;
     Q_EMIT headerDataChanged(Qt::Horizontal, column, column);
@@ -51,11 +56,11 @@ void BoundGridModel::setAlignment(int column, Qt::Alignment alignment) {
 Qt::Alignment BoundGridModel::alignmentOfCode(int code) {
     switch (code) {
         case 1:
-            return Qt::AlignLeft | Qt::AlignVCenter;
+            return Qt::AlignLeft | Qt::AlignAbsolute | Qt::AlignVCenter;
         case 4:
             return Qt::AlignCenter;
         case 7:
-            return Qt::AlignRight | Qt::AlignVCenter;
+            return Qt::AlignRight | Qt::AlignAbsolute | Qt::AlignVCenter;
         default:
             return Qt::AlignVCenter;
     }

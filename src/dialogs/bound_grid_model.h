@@ -41,12 +41,15 @@ class BoundGridModel : public QAbstractTableModel {
     QVariant cell(int row, int column) const;
     // Re-reads the rows after rows were added or deleted through the recordset.
     void reload();
+    // Shows the recordset's rows as they stand after rows were added or deleted through it,
+    // without reading them again (a row added to a source that selects none stays shown).
+    void showRows();
 
     // Column look, as the dialogs set it.
     void setHeader(int column, const QString& text);
     void setAlignment(int column, Qt::Alignment alignment);
     // The alignment the component's grids give a code: 7 right-centred, 1 left-centred,
-    // 4 centred.
+    // 4 centred; right and left as the eye sees them, also in a right-to-left grid.
     static Qt::Alignment alignmentOfCode(int code);
 
     // The last write the engine refused, for the window to show.

@@ -7,6 +7,7 @@
 #include "db/file_names.h"
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/language_switch.h"
+#include "dialogs/window_controls.h"
 #include "import/scan_ranges.h"
 #include "platform/captions.h"
 #include "platform/failure.h"
@@ -34,11 +35,10 @@ EditRangesWindow::EditRangesWindow(const QString& databaseFolder, qint16 languag
     view_ = new QTableView(this);
     view_->setObjectName(QStringLiteral("VSEditRange"));
     view_->setModel(grid_);
-    QPushButton* reset =
-        makeCaptionedButton(QStringLiteral("cmdNoneItems"), QStringLiteral("אפס את כולם"),
-                            QStringLiteral("Reset all"), this);
-    QPushButton* close = makeCaptionedButton(QStringLiteral("cmdClose"), QStringLiteral("סגור"),
-                                             QStringLiteral("Close"), this);
+    QPushButton* reset = makeButton(QStringLiteral("cmdNoneItems"), QStringLiteral("אפס את כולם"),
+                                    QStringLiteral("Reset all"), this);
+    QPushButton* close = makeButton(QStringLiteral("cmdClose"), QStringLiteral("סגור"),
+                                    QStringLiteral("Close"), this);
     auto* layout = new QGridLayout(this);
     layout->addWidget(view_, 0, 0, 1, 2);
     layout->addWidget(reset, 1, 0);

@@ -64,12 +64,4 @@ void FillComboFromList(QComboBox* combo, const QString& list) {
     combo->setCurrentIndex(-1);
 }
 
-QPushButton* makeCaptionedButton(const QString& name, const QString& hebrew, const QString& english,
-                                 QWidget* parent) {
-    auto* button = new QPushButton(hebrew, parent);
-    button->setObjectName(name);
-    button->setProperty("Tag", english);
-    return button;
-}
-
 }  // namespace etq

@@ -4,7 +4,6 @@
 
 class QComboBox;
 class QLabel;
-class QPushButton;
 class QWidget;
 
 namespace etq {
@@ -31,10 +30,5 @@ void ApplyTagCaptions(QWidget* window, QWidget* container = nullptr);
 // Empties the combo box and adds the entries of `list`, split at ";", in order, leaving none
 // selected.
 void FillComboFromList(QComboBox* combo, const QString& list);
-
-// A button of a dialog named `name` with its Hebrew design caption, carrying its English
-// caption in the property "Tag" for ApplyTagCaptions.
-QPushButton* makeCaptionedButton(const QString& name, const QString& hebrew, const QString& english,
-                                 QWidget* parent);
 
 }  // namespace etq

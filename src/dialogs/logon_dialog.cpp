@@ -7,7 +7,10 @@
 #include <QPushButton>
 
 #include "import/connection.h"
+#include "import/sql_source.h"
 #include "platform/captions.h"
+#include "platform/failure.h"
+#include "platform/log.h"
 
 namespace etq {
 
@@ -51,18 +54,22 @@ LogonDialog::LogonDialog(Context& context, QWidget* parent) : QDialog(parent), c
     message_ = new QLabel(this);
     message_->setObjectName(QStringLiteral("LblMsg"));
     QPushButton* check = makeButton(QStringLiteral("CmdCheck"), QStringLiteral("בדיקה"), this);
+    QPushButton* checkSql =
+        makeButton(QStringLiteral("CmdCheckSql"), QStringLiteral("בדיקת SQL Server"), this);
     QPushButton* ok = makeButton(QStringLiteral("cmdOK"), QStringLiteral("אישור"), this);
     QPushButton* cancel = makeButton(QStringLiteral("cmdCancel"), QStringLiteral("ביטול"), this);
     ok->setDefault(true);
 
     auto* layout = new QGridLayout(this);
-    layout->addWidget(frame, 0, 0, 1, 3);
-    layout->addWidget(message_, 1, 0, 1, 3);
+    layout->addWidget(frame, 0, 0, 1, 4);
+    layout->addWidget(message_, 1, 0, 1, 4);
     layout->addWidget(check, 2, 0);
-    layout->addWidget(ok, 2, 1);
-    layout->addWidget(cancel, 2, 2);
+    layout->addWidget(checkSql, 2, 1);
+    layout->addWidget(ok, 2, 2);
+    layout->addWidget(cancel, 2, 3);
 
     connect(check, &QPushButton::clicked, this, &LogonDialog::check);
+    connect(checkSql, &QPushButton::clicked, this, &LogonDialog::checkSqlServer);
     connect(ok, &QPushButton::clicked, this, &LogonDialog::accept);
     connect(cancel, &QPushButton::clicked, this, &LogonDialog::reject);
 }
@@ -70,6 +77,19 @@ LogonDialog::LogonDialog(Context& context, QWidget* parent) : QDialog(parent), c
 void LogonDialog::check() {
     const bool found = companyFolderHasAccounts(server_->text(), database_->text());
     message_->setText(hebrewCaption(found ? 2 : 3));
+}
+
+void LogonDialog::checkSqlServer() {
+    ConnParams params = context_.connection;
+    params.server = server_->text();
+    params.database = database_->text();
+    try {
+        TestSqlServerConnection(params);
+        message_->setText(hebrewCaption(2));
+    } catch (const std::exception& e) {
+        qCInfo(log::import) << "SQL Server source test:" << describe(e);
+        message_->setText(hebrewCaption(3) + u'\n' + describe(e));
+    }
 }
 
 void LogonDialog::accept() {

@@ -12,6 +12,9 @@ class Context;
 // The connection dialog frmLogon: edits the server folder and the company folder of the
 // connection parameters, checks that the company folder holds the host's accounts file, and
 // saves both texts to the context's connection parameters and its settings store on accept.
+// CmdCheckSql tests the SQL Server source instead: the two texts as server and database, with
+// the stored user, password and driver; a failure shows the driver's words under caption 3 and
+// goes to the log.
 class LogonDialog : public QDialog {
     Q_OBJECT
 
@@ -20,6 +23,7 @@ class LogonDialog : public QDialog {
 
   private:
     void check();
+    void checkSqlServer();
     void accept() override;
 
     QLineEdit* server_;

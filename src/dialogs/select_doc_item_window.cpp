@@ -7,6 +7,7 @@
 
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/language_switch.h"
+#include "dialogs/window_controls.h"
 #include "platform/captions.h"
 #include "platform/failure.h"
 #include "platform/log.h"
@@ -70,19 +71,17 @@ void SelectDocItemWindow::buildControls() {
     documentView_ = makeGrid(QStringLiteral("VSDocHeaders"), documents_);
     lineView_ = makeGrid(QStringLiteral("VSDocLines"), lines_);
     QPushButton* allDocuments =
-        makeCaptionedButton(QStringLiteral("CmdAllHeaders"), QStringLiteral("סמן את כולם"),
-                            QStringLiteral("Select all"), this);
+        makeButton(QStringLiteral("CmdAllHeaders"), QStringLiteral("סמן את כולם"),
+                   QStringLiteral("Select all"), this);
     QPushButton* noDocuments =
-        makeCaptionedButton(QStringLiteral("cmdNoneHeaders"), QStringLiteral("בטל את כולם"),
-                            QStringLiteral("Unselect all"), this);
-    QPushButton* allLines =
-        makeCaptionedButton(QStringLiteral("CmdAllLines"), QStringLiteral("סמן את כולם"),
-                            QStringLiteral("Select all"), this);
-    QPushButton* noLines =
-        makeCaptionedButton(QStringLiteral("cmdNoneLines"), QStringLiteral("בטל את כולם"),
-                            QStringLiteral("Unselect all"), this);
-    QPushButton* close = makeCaptionedButton(QStringLiteral("cmdClose"), QStringLiteral("סגור"),
-                                             QStringLiteral("Close"), this);
+        makeButton(QStringLiteral("cmdNoneHeaders"), QStringLiteral("בטל את כולם"),
+                   QStringLiteral("Unselect all"), this);
+    QPushButton* allLines = makeButton(QStringLiteral("CmdAllLines"), QStringLiteral("סמן את כולם"),
+                                       QStringLiteral("Select all"), this);
+    QPushButton* noLines = makeButton(QStringLiteral("cmdNoneLines"), QStringLiteral("בטל את כולם"),
+                                      QStringLiteral("Unselect all"), this);
+    QPushButton* close = makeButton(QStringLiteral("cmdClose"), QStringLiteral("סגור"),
+                                    QStringLiteral("Close"), this);
 
     auto* layout = new QGridLayout(this);
     layout->addWidget(documentView_, 0, 0, 1, 3);

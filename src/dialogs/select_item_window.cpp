@@ -10,6 +10,7 @@
 
 #include "dialogs/bound_grid_model.h"
 #include "dialogs/language_switch.h"
+#include "dialogs/window_controls.h"
 #include "platform/captions.h"
 #include "platform/failure.h"
 #include "platform/log.h"
@@ -49,20 +50,7 @@ constexpr int kRightCentred = 7;
 
 QPushButton* makeButton(QStringView name, QWidget* parent) {
     const Caption& c = captionOf(name);
-    return makeCaptionedButton(name.toString(), c.hebrew.toString(), c.english.toString(), parent);
-}
-
-QLineEdit* makeBox(const QString& name, QWidget* parent) {
-    auto* box = new QLineEdit(parent);
-    box->setObjectName(name);
-    return box;
-}
-
-QComboBox* makeList(const QString& name, const QString& items, QWidget* parent) {
-    auto* combo = new QComboBox(parent);
-    combo->setObjectName(name);
-    FillComboFromList(combo, items);
-    return combo;
+    return etq::makeButton(name.toString(), c.hebrew.toString(), c.english.toString(), parent);
 }
 
 }  // namespace
@@ -101,10 +89,10 @@ void SelectItemWindow::buildControls() {
     view_->setSelectionMode(QAbstractItemView::SingleSelection);
 
     sortBy_ = makeList(QStringLiteral("cmbItmSortBy"), QStringLiteral("מפתח פריט;שם פריט"), this);
-    sortOrder_ = makeList(QStringLiteral("cmbItmSortOrder"), QStringLiteral("עולה;יורד"), this);
-    auto* sortLabel = new QLabel(captionOf(u"lblSortBy").hebrew.toString(), this);
-    sortLabel->setObjectName(QStringLiteral("lblSortBy"));
-    sortLabel->setProperty("Tag", captionOf(u"lblSortBy").english.toString());
+    sortOrder_ = makeList(QStringLiteral("cmbItmSortOrder"), kSortOrderList, this);
+    const Caption& sortCaption = captionOf(u"lblSortBy");
+    QLabel* sortLabel = makeLabel(QStringLiteral("lblSortBy"), sortCaption.hebrew.toString(),
+                                  sortCaption.english.toString(), this);
     allCopies_ = makeBox(QStringLiteral("txtAllCopis"), this);
     findKey_ = makeBox(QStringLiteral("txtToItemKey"), this);
     findName_ = makeBox(QStringLiteral("txtToItemName"), this);
@@ -157,7 +145,7 @@ void SelectItemWindow::switchToEnglish() {
     MirrorControls(this);
     ApplyTagCaptions(this);
     FillComboFromList(sortBy_, QStringLiteral("Item code;Item Name"));
-    FillComboFromList(sortOrder_, QStringLiteral("Up;Down"));
+    FillComboFromList(sortOrder_, kEnglishSortOrderList);
     findName_->setAlignment(Qt::AlignLeft | Qt::AlignAbsolute);
 }
 

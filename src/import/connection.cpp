@@ -1,8 +1,10 @@
 #include "import/connection.h"
 
 #include <QFileInfo>
+#include <QStringList>
 
 #include "import/host_reading.h"
+#include "import/odbc.h"
 #include "platform/settings_keys.h"
 #include "platform/settings_store.h"
 #include "platform/user_paths.h"
@@ -26,14 +28,31 @@ void GetConnParams(Context& context) {
     p.user = readParam(store, QStringLiteral("ConnUID"));
     p.password = readParam(store, QStringLiteral("ConnPWD"));
     p.database = readParam(store, QStringLiteral("ConnDataBase"));
+    p.driver = readParam(store, QStringLiteral("ConnDriver"));
 }
 
+namespace {
+
+QString serverWithPort(const QString& server) {
+    if (server.isEmpty() || server.contains(u'\\') || server.contains(u',')) return server;
+    return server + QStringLiteral(",1433");
+}
+
+}  // namespace
+
 QString BuildConnString(const QString& server, const QString& user, const QString& password,
-                        const QString& database, qint16 form) {
+                        const QString& database, qint16 form, const QString& driver) {
     switch (form) {
         case 1:
-            return QStringLiteral("driver={SQL Server};server=%1;uid=%2;pwd=%3;database=%4")
-                .arg(server, user, password, database);
+            return QStringList{
+                QStringLiteral("Driver=") +
+                    odbc::bracedValue(driver.isEmpty() ? settingDefault(kParams, u"ConnDriver")
+                                                       : driver),
+                odbc::attribute(QStringLiteral("Server"), serverWithPort(server)),
+                odbc::attribute(QStringLiteral("UID"), user),
+                odbc::attribute(QStringLiteral("Database"), database),
+                odbc::attribute(QStringLiteral("PWD"), password)}
+                .join(u';');
         case 2:
             return QStringLiteral(
                        "Provider=sqloledb;Data Source=%1;User Id=%2;Password=%3;Initial Catalog=%4")
@@ -45,6 +64,10 @@ QString BuildConnString(const QString& server, const QString& user, const QStrin
         default:
             return {};
     }
+}
+
+QString sqlServerConnString(const ConnParams& p) {
+    return BuildConnString(p.server, p.user, p.password, p.database, 1, p.driver);
 }
 
 QString companyFolder(const ConnParams& p) {

@@ -13,7 +13,8 @@ ConnParams::ConnParams()
     : server(settingDefault(u"Params", u"ConnServer")),
       user(settingDefault(u"Params", u"ConnUID")),
       password(settingDefault(u"Params", u"ConnPWD")),
-      database(settingDefault(u"Params", u"ConnDataBase")) {}
+      database(settingDefault(u"Params", u"ConnDataBase")),
+      driver(settingDefault(u"Params", u"ConnDriver")) {}
 
 Context::Context()
     : applicationName(QStringLiteral("Etiquon")),

@@ -19,6 +19,7 @@ struct ConnParams {
     QString user;      // ConnUID
     QString password;  // ConnPWD
     QString database;  // ConnDataBase
+    QString driver;    // ConnDriver: the ODBC driver of the SQL Server source
 };
 
 // What a run needs from its surroundings: where its settings are kept, how it talks to the

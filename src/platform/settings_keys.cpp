@@ -85,6 +85,8 @@ constexpr SettingKey kKeys[] = {
     {0, u"Params", u"ConnUID", u"", -1, false, T::Text, u"sa"},
     {0, u"Params", u"ConnPWD", u"", -1, false, T::Text, u""},
     {0, u"Params", u"ConnDataBase", u"", -1, false, T::Text, u"corvan02"},
+    // The ODBC driver of the SQL Server source, as the driver manager names it (odbcinst.ini).
+    {0, u"Params", u"ConnDriver", u"", -1, false, T::Text, u"FreeTDS"},
     // The language of messages and dialogs: "1" English, anything else Hebrew.
     {0, u"Params", u"Language", u"", -1, false, T::Text, u"0"},
 };

@@ -11,6 +11,8 @@
 #include "import/connection.h"
 #include "platform/context.h"
 #include "platform/settings_store.h"
+#include "support/log_capture.h"
+#include "support/sql_source_file.h"
 
 namespace etq {
 namespace {
@@ -23,13 +25,13 @@ class ConnectionTest : public ::testing::Test {
 
 TEST_F(ConnectionTest, ConnectionTextsByForm) {
     EXPECT_EQ(BuildConnString("srv", "sa", "pw", "corvan02", 1),
-              "driver={SQL Server};server=srv;uid=sa;pwd=pw;database=corvan02");
+              "Driver={FreeTDS};Server={srv,1433};UID=sa;Database=corvan02;PWD=pw");
     EXPECT_EQ(BuildConnString("srv", "sa", "pw", "corvan02", 2),
               "Provider=sqloledb;Data Source=srv;User Id=sa;Password=pw;Initial Catalog=corvan02");
     EXPECT_EQ(BuildConnString("srv", "sa", QString(), "db", 2),
               "Provider=sqloledb;Data Source=srv;User Id=sa;Password=;Initial Catalog=db");
     EXPECT_EQ(BuildConnString("srv", "sa", "%1", "db", 1),
-              "driver={SQL Server};server=srv;uid=sa;pwd=%1;database=db");
+              "Driver={FreeTDS};Server={srv,1433};UID=sa;Database=db;PWD=%1");
     EXPECT_EQ(BuildConnString("srv", "sa", "pw", "db", 0), "");
     EXPECT_EQ(BuildConnString("srv", "sa", "pw", "db", 4), "");
 }
@@ -94,6 +96,29 @@ TEST_F(ConnectionTest, TheDialogChecksForTheAccountsFileAndSavesOnAccept) {
     EXPECT_EQ(readSetting("Etiquon", "Params", "ConnServer", ""), host.path() + "/");
     EXPECT_EQ(readSetting("Etiquon", "Params", "ConnDataBase", ""), "demo");
     EXPECT_FALSE(SettingsStore("Etiquon").contains("Params", "ConnUID"));
+}
+
+TEST_F(ConnectionTest, TheDialogTestsTheSqlServerSourceWithTheTypedTexts) {
+    QTemporaryDir dir;
+    test::writeSqlSourceFile(dir.filePath("host.db"));
+    context.connection = test::sqlSourceParams(dir.filePath("elsewhere.db"));
+    context.connection.database = "not used";
+    LogonDialog dialog(context);
+    auto* database = dialog.findChild<QLineEdit*>("txtConnDatabase");
+    auto* message = dialog.findChild<QLabel*>("LblMsg");
+    auto* check = dialog.findChild<QPushButton*>("CmdCheckSql");
+    ASSERT_TRUE(database && message && check);
+    database->setText(dir.filePath("host.db"));
+    check->click();
+    EXPECT_EQ(message->text(), "הבדיקה הסתיימה בהצלחה");
+
+    context.connection.driver = "No Such Driver";
+    test::LogCapture log;
+    check->click();
+    EXPECT_TRUE(message->text().startsWith("הבדיקה לא הסתיימה בהצלחה\n"));
+    EXPECT_TRUE(message->text().contains("No Such Driver"));
+    EXPECT_TRUE(log.contains("etiquon.import: SQL Server source test:"));
+    EXPECT_FALSE(SettingsStore("Etiquon").contains("Params", "ConnDataBase"));
 }
 
 }  // namespace

@@ -135,7 +135,8 @@ TEST_F(DocLineSelectionTest, WindowShowsTheLinesOfTheCurrentDocument) {
     EXPECT_EQ(header(window.documents(), 0), GetCaption(7, 0));
     EXPECT_EQ(header(window.documents(), 5), GetCaption(12, 0));
     EXPECT_EQ(header(window.lines(), 6), GetCaption(19, 0));
-    EXPECT_EQ(alignment(window.lines(), 0), int(Qt::AlignRight | Qt::AlignVCenter));
+    EXPECT_EQ(alignment(window.lines(), 0),
+              int(Qt::AlignRight | Qt::AlignAbsolute | Qt::AlignVCenter));
     ASSERT_EQ(window.lines().rowCount(), 2);
 
     documentView->setCurrentIndex(window.documents().index(1, 0));
@@ -155,7 +156,8 @@ TEST_F(DocLineSelectionTest, WindowShowsTheLinesOfTheCurrentDocument) {
     EXPECT_EQ(english.layoutDirection(), Qt::LeftToRight);
     EXPECT_EQ(english.findChild<QPushButton*>("cmdNoneHeaders")->text(), "Unselect all");
     EXPECT_EQ(header(english.lines(), 5), "Copies");
-    EXPECT_EQ(alignment(english.documents(), 0), int(Qt::AlignLeft | Qt::AlignVCenter));
+    EXPECT_EQ(alignment(english.documents(), 0),
+              int(Qt::AlignLeft | Qt::AlignAbsolute | Qt::AlignVCenter));
 }
 
 TEST_F(DocLineSelectionTest, RangesWindowEditsAndResetsTheNextScanStart) {
@@ -168,7 +170,7 @@ TEST_F(DocLineSelectionTest, RangesWindowEditsAndResetsTheNextScanStart) {
     ASSERT_EQ(grid.rowCount(), 7);
     EXPECT_EQ(header(grid, 0), GetCaption(4, 0));
     EXPECT_EQ(header(grid, 2), GetCaption(6, 0));
-    EXPECT_EQ(alignment(grid, 2), int(Qt::AlignRight | Qt::AlignVCenter));
+    EXPECT_EQ(alignment(grid, 2), int(Qt::AlignRight | Qt::AlignAbsolute | Qt::AlignVCenter));
     EXPECT_TRUE(grid.setData(grid.index(1, 2), "3", Qt::EditRole));
     jet::Database docs = jet::Database::open(path(db::kDocDatabaseFile));
     EXPECT_EQ(rows(docs, "SELECT FromIndx FROM tWizFileRanges WHERE WizFileID = 2"),
